@@ -1,0 +1,75 @@
+#pragma once
+// QelBaseUnknown: the root of every object the host and the module exchange.
+//
+// Objects are reference counted and start with one reference, owned by their creator.
+// They are destroyed by the Release that drops the count to zero, never by `delete`
+// (destructors are protected). Interfaces derive *virtually* from QelBaseUnknown, so an
+// object that implements several interfaces directly still has one count. An interface
+// may also be provided by a tie (a small counted object forwarding to the
+// implementation) or by a data extension; both are found through QelDictionary.
+//
+//   QelVar<QelIAlias> alias = object;   // queries; null when the object has no alias
+//   if (alias) name = alias->GetAlias();
+#include <cstddef>
+#include <cstdint>
+
+#include "QelIID.h"
+#include "QelStatus.h"
+
+class QelMetaObject;
+struct QelWeakFlag;
+
+class QelBaseUnknown {
+ public:
+  // Marks the class as an interface for QelVar: each interface redeclares both.
+  using QelInterfaceSelf = QelBaseUnknown;
+  static constexpr QelIID IID = QelIID::Parse("{5E0C41A2-7B61-4C39-9D0A-0B3F5A1E2C01}");
+
+  QelBaseUnknown(const QelBaseUnknown&) = delete;
+  QelBaseUnknown& operator=(const QelBaseUnknown&) = delete;
+
+  uint32_t AddRef();
+  uint32_t Release();
+
+  // Gives, with a new reference, the pointer for `iid`: the object itself, a tie, or an
+  // interface of a data extension of the object's late type. E_NOINTERFACE and a null
+  // `out` when the object has none.
+  virtual HRESULT QueryInterface(const QelIID& iid, void** out);
+
+  // The object that really implements: a tie answers its implementation, others themselves.
+  virtual QelBaseUnknown* GetImpl();
+
+  // The class description; implementation classes override it with their own.
+  virtual const QelMetaObject* GetMetaObject() const;
+  static const QelMetaObject& MetaObject();
+
+  // The type under which data extensions are looked up; by default the class name.
+  virtual const char* GetLateType() const;
+
+  const char* IsA() const;
+  bool IsAKindOf(const char* className) const;
+  // Identity of the implementation, so a tie equals the object it forwards to.
+  bool IsEqual(QelBaseUnknown* other);
+
+  // Number of QelBaseUnknown objects alive in the process: a debug aid that lets tests
+  // prove a scenario leaks nothing and leaves no cycle behind.
+  static int64_t LiveObjectCount();
+
+ protected:
+  QelBaseUnknown();
+  virtual ~QelBaseUnknown();
+
+  // The interfaces the class implements itself; overrides answer theirs, then defer to
+  // their base class. See QelQueryDirect in QelVar.h for the usual form.
+  virtual void* QueryDirect(const QelIID& iid);
+
+ private:
+  friend class QelBaseUnknown_WR;
+  QelWeakFlag* AcquireWeakFlag();
+  QelBaseUnknown* FindOrCreateExtension(const QelMetaObject& extension);
+
+  struct Extensions;
+  uint32_t refs_ = 1;
+  QelWeakFlag* weak_ = nullptr;
+  Extensions* extensions_ = nullptr;
+};

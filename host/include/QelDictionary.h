@@ -1,0 +1,76 @@
+#pragma once
+// QelDictionary: the host's component dictionary. It maps (class name or late type,
+// interface identifier) to the factory that gives that interface on such an object, maps
+// late types to the data extensions that extend them, and component names to their
+// creation functions. QueryInterface consults it after an object's own interfaces.
+//
+// Entries carry the framework that registered them so that a module being unloaded can
+// take all of its entries back (its factories would otherwise dangle).
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "QelVar.h"
+
+class QelMetaObject;
+
+// Gives a new reference to an object that answers the interface on `impl`: a new tie
+// holding one reference to `impl`, or `impl` itself (direct implementation).
+using QelFactory = QelBaseUnknown* (*)(QelBaseUnknown* impl);
+// Creates the data extension of `extended` (a new reference, kept by the extended object).
+using QelExtensionCreator = QelBaseUnknown* (*)(QelBaseUnknown* extended);
+// Creates (or hands out) a named component, with a new reference.
+using QelNamedCreator = QelBaseUnknown* (*)();
+
+class QelDictionary {
+ public:
+  static QelDictionary& Get();
+
+  void Register(std::string_view classOrLateType, const QelIID& iid, QelFactory factory,
+                std::string_view framework = {});
+  void RegisterExtension(std::string_view lateType, const QelMetaObject& extension, QelExtensionCreator creator,
+                         std::string_view framework = {});
+  void RegisterNamedCreator(std::string_view name, QelNamedCreator creator, std::string_view framework = {});
+  // Removes every entry registered under the framework's name.
+  void RemoveFramework(std::string_view framework);
+
+  QelFactory FindFactory(std::string_view classOrLateType, const QelIID& iid) const;
+  QelNamedCreator FindNamedCreator(std::string_view name) const;
+
+  struct ExtensionEntry {
+    std::string lateType;
+    const QelMetaObject* extension;
+    QelExtensionCreator creator;
+    std::string framework;
+  };
+  // The extensions registered for a late type, in order of registration.
+  std::vector<const ExtensionEntry*> ExtensionsOf(std::string_view lateType) const;
+
+ private:
+  QelDictionary() = default;
+  struct FactoryEntry {
+    std::string key;
+    QelIID iid;
+    QelFactory factory;
+    std::string framework;
+  };
+  struct NamedEntry {
+    std::string name;
+    QelNamedCreator creator;
+    std::string framework;
+  };
+  std::vector<FactoryEntry> factories_;
+  std::vector<ExtensionEntry> extensions_;
+  std::vector<NamedEntry> named_;
+};
+
+// Creates the component registered under `name` and queries `iid` on it. E_FAIL when no
+// such component exists, E_NOINTERFACE when it lacks the interface.
+HRESULT QelInstantiateComponent(const char* name, const QelIID& iid, void** out);
+
+template <class I>
+QelVar<I> QelInstantiateComponent(const char* name) {
+  void* out = nullptr;
+  if (QelInstantiateComponent(name, I::IID, &out) != S_OK) return nullptr;
+  return QelVar<I>::Adopt(static_cast<I*>(out));
+}

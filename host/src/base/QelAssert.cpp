@@ -1,0 +1,69 @@
+#include "QelAssert.h"
+
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+
+namespace {
+int g_developmentStage = -1;  // -1: not decided yet, read from the environment
+QelAssertionCapture* g_capture = nullptr;
+
+const char* BaseName(const char* path) {
+  const char* slash = std::strrchr(path, '/');
+  return slash ? slash + 1 : path;
+}
+}  // namespace
+
+std::string QelFormatAssertion(const char* kind, const char* detail, const char* file, int line) {
+  char buffer[287];
+  std::snprintf(buffer, sizeof buffer, ">> ASSERTION FAILED %.32s: %.40s [File: %.128s:%4d].<<\n", kind ? kind : "",
+                detail ? detail : "", file ? file : "", line);
+  return buffer;
+}
+
+void QelAssertionFailed(const char* kind, const char* detail, const char* file, int line) {
+  const char* shortFile = BaseName(file ? file : "");
+  std::string text = QelFormatAssertion(kind, detail, shortFile, line);
+  if (g_capture) {
+    g_capture->reports_.push_back({kind ? kind : "", detail ? detail : "", shortFile, line, text});
+    return;
+  }
+  if (QelDevelopmentStage()) {
+    std::fputs(text.c_str(), stderr);
+    QelSysLogAbend(text.c_str());
+  }
+  QelSysLogError(text.c_str());
+}
+
+bool QelDevelopmentStage() {
+  if (g_developmentStage < 0) g_developmentStage = QelGetEnv("QEL_DEVELOPMENT_STAGE") == "1" ? 1 : 0;
+  return g_developmentStage == 1;
+}
+
+void QelSetDevelopmentStage(bool on) { g_developmentStage = on ? 1 : 0; }
+
+void QelSysLogError(const char* text) {
+  std::fputs(text ? text : "", stderr);
+  std::fflush(stderr);
+}
+
+void QelSysLogAbend(const char* text) {
+  std::fprintf(stderr, "qel: abnormal end: %s", text ? text : "");
+  std::fflush(stderr);
+  std::abort();
+}
+
+QelAssertionCapture::QelAssertionCapture() : outer_(g_capture) { g_capture = this; }
+QelAssertionCapture::~QelAssertionCapture() { g_capture = outer_; }
+
+int QelAssertionCapture::Count(std::string_view kind, std::string_view detail) const {
+  int n = 0;
+  for (const auto& report : reports_)
+    if (report.kind == kind && (detail.empty() || report.detail == detail)) ++n;
+  return n;
+}
+
+std::string QelGetEnv(const char* name) {
+  const char* value = name ? std::getenv(name) : nullptr;
+  return value ? value : "";
+}

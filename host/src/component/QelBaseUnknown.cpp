@@ -1,0 +1,135 @@
+#include "QelBaseUnknown.h"
+
+#include <cstdio>
+#include <utility>
+#include <vector>
+
+#include "QelAssert.h"
+#include "QelBaseUnknown_WR.h"
+#include "QelDictionary.h"
+#include "QelMetaObject.h"
+
+namespace {
+int64_t g_liveObjects = 0;
+// A count this high marks an object in destruction: a balanced AddRef/Release made by
+// code the destructor calls cannot reach zero again and delete twice.
+constexpr uint32_t kDestroying = 1u << 30;
+}  // namespace
+
+struct QelBaseUnknown::Extensions {
+  std::vector<std::pair<const QelMetaObject*, QelBaseUnknown*>> items;
+};
+
+QelBaseUnknown::QelBaseUnknown() { ++g_liveObjects; }
+
+QelBaseUnknown::~QelBaseUnknown() {
+  if (extensions_) {
+    // Taken out first: an extension's destructor may query this object again.
+    Extensions* owned = std::exchange(extensions_, nullptr);
+    for (auto& [meta, extension] : owned->items) extension->Release();
+    delete owned;
+  }
+  if (weak_) {
+    weak_->alive = false;
+    if (--weak_->refs == 0) delete weak_;
+  }
+  --g_liveObjects;
+}
+
+int64_t QelBaseUnknown::LiveObjectCount() { return g_liveObjects; }
+
+uint32_t QelBaseUnknown::AddRef() { return ++refs_; }
+
+uint32_t QelBaseUnknown::Release() {
+  if (refs_ == 0) {
+    QelAssertBool("release past zero");
+    return 0;
+  }
+  if (--refs_ != 0) return refs_;
+  refs_ = kDestroying;
+  // Weak references die before the destructors run, so no upward link can reach a
+  // half-destroyed object.
+  if (weak_) weak_->alive = false;
+  delete this;
+  return 0;
+}
+
+QelWeakFlag* QelBaseUnknown::AcquireWeakFlag() {
+  if (!weak_) weak_ = new QelWeakFlag{1, refs_ < kDestroying};
+  return weak_;
+}
+
+const QelMetaObject& QelBaseUnknown::MetaObject() {
+  static const QelMetaObject& meta =
+      QelMetaObject::Declare("QelBaseUnknown", QelMetaKind::Implementation, nullptr, "QelHost");
+  return meta;
+}
+
+const QelMetaObject* QelBaseUnknown::GetMetaObject() const { return &MetaObject(); }
+
+const char* QelBaseUnknown::GetLateType() const { return GetMetaObject()->Name(); }
+
+const char* QelBaseUnknown::IsA() const { return GetMetaObject()->Name(); }
+
+bool QelBaseUnknown::IsAKindOf(const char* className) const {
+  return className && GetMetaObject()->IsAKindOf(className);
+}
+
+bool QelBaseUnknown::IsEqual(QelBaseUnknown* other) {
+  return other && GetImpl() == other->GetImpl();
+}
+
+QelBaseUnknown* QelBaseUnknown::GetImpl() { return this; }
+
+void* QelBaseUnknown::QueryDirect(const QelIID& iid) {
+  return iid == QelBaseUnknown::IID ? this : nullptr;
+}
+
+QelBaseUnknown* QelBaseUnknown::FindOrCreateExtension(const QelMetaObject& extension) {
+  if (!extensions_) extensions_ = new Extensions;
+  for (auto& [meta, object] : extensions_->items)
+    if (meta == &extension) return object;
+  for (const auto* entry : QelDictionary::Get().ExtensionsOf(GetLateType())) {
+    if (entry->extension != &extension) continue;
+    QelBaseUnknown* created = entry->creator(this);
+    if (created) extensions_->items.emplace_back(&extension, created);
+    return created;
+  }
+  return nullptr;
+}
+
+HRESULT QelBaseUnknown::QueryInterface(const QelIID& iid, void** out) {
+  if (!out) return E_UNEXPECTED;
+  *out = nullptr;
+  if (void* mine = QueryDirect(iid)) {
+    AddRef();
+    *out = mine;
+    return S_OK;
+  }
+  const QelDictionary& dictionary = QelDictionary::Get();
+  // Answer with the factory (tie or direct) from the dictionary: first the ties of the
+  // object's class and its ancestors, then the data extensions of its late type.
+  auto answerWith = [&](QelFactory factory, QelBaseUnknown* impl) -> HRESULT {
+    QelBaseUnknown* made = factory(impl);
+    if (!made) return E_NOINTERFACE;
+    void* found = made->QueryDirect(iid);
+    if (!found) {
+      made->Release();
+      return E_NOINTERFACE;
+    }
+    *out = found;  // the factory's reference becomes the caller's
+    return S_OK;
+  };
+  for (const QelMetaObject* meta = GetMetaObject(); meta; meta = meta->Base())
+    if (QelFactory factory = dictionary.FindFactory(meta->Name(), iid)) return answerWith(factory, this);
+  if (QelFactory factory = dictionary.FindFactory(GetLateType(), iid)) return answerWith(factory, this);
+  for (const auto* entry : dictionary.ExtensionsOf(GetLateType())) {
+    for (const QelMetaObject* meta = entry->extension; meta; meta = meta->Base()) {
+      QelFactory factory = dictionary.FindFactory(meta->Name(), iid);
+      if (!factory) continue;
+      QelBaseUnknown* extension = FindOrCreateExtension(*entry->extension);
+      return extension ? answerWith(factory, extension) : E_NOINTERFACE;
+    }
+  }
+  return E_NOINTERFACE;
+}

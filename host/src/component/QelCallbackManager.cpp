@@ -1,0 +1,82 @@
+#include "QelCallbackManager.h"
+
+#include <algorithm>
+
+QelCallbackManager& QelCallbackManager::Get() {
+  static auto* manager = new QelCallbackManager;  // lives until the process ends
+  return *manager;
+}
+
+QelCallbackId QelCallbackManager::AddCallback(QelBaseUnknown* publisher, std::string_view notification,
+                                              QelBaseUnknown* subscriber, QelCallbackFn fn) {
+  if (!publisher || !fn) return 0;
+  QelCallbackId id = nextId_++;
+  entries_.push_back({id, QelBaseUnknown_WR(publisher), std::string(notification), QelBaseUnknown_WR(subscriber),
+                      subscriber != nullptr, std::move(fn)});
+  return id;
+}
+
+bool QelCallbackManager::RemoveCallback(QelCallbackId id) {
+  for (auto& entry : entries_) {
+    if (entry.id == id && !entry.removed) {
+      entry.removed = true;
+      Compact();
+      return true;
+    }
+  }
+  return false;
+}
+
+int QelCallbackManager::RemoveCallbacksOn(QelBaseUnknown* publisher, QelBaseUnknown* subscriber,
+                                          std::string_view notification) {
+  QelBaseUnknown* subscriberImpl = subscriber ? subscriber->GetImpl() : nullptr;
+  QelBaseUnknown* publisherImpl = publisher ? publisher->GetImpl() : nullptr;
+  int removed = 0;
+  for (auto& entry : entries_) {
+    if (entry.removed || entry.subscriber.GetRaw() != subscriberImpl) continue;
+    if (publisherImpl && entry.publisher.GetRaw() != publisherImpl) continue;
+    if (!notification.empty() && entry.notification != notification) continue;
+    entry.removed = true;
+    ++removed;
+  }
+  Compact();
+  return removed;
+}
+
+void QelCallbackManager::Dispatch(QelBaseUnknown* publisher, std::string_view notification,
+                                  QelBaseUnknown* payload) {
+  if (!publisher) return;
+  QelBaseUnknown* publisherImpl = publisher->GetImpl();
+  // Keeps the publisher and payload alive for the whole dispatch.
+  QelBaseUnknown_var holdPublisher(publisher), holdPayload(payload);
+  ++dispatchDepth_;
+  // Only the callbacks present now take part; entries_ may grow meanwhile, so walk by index.
+  const size_t count = entries_.size();
+  for (size_t i = 0; i < count && i < entries_.size(); ++i) {
+    if (entries_[i].removed || entries_[i].notification != notification) continue;
+    if (entries_[i].publisher.GetRaw() != publisherImpl) continue;
+    // A subscriber that went away without removing its callback is skipped and dropped.
+    QelBaseUnknown_var subscriber = entries_[i].subscriber.Get();
+    if (entries_[i].hasSubscriber && !subscriber) {
+      entries_[i].removed = true;
+      continue;
+    }
+    QelCallbackFn fn = entries_[i].fn;  // a copy: the entry may be removed by the call
+    fn(publisher, payload);
+  }
+  --dispatchDepth_;
+  Compact();
+}
+
+int QelCallbackManager::CountCallbacks(QelBaseUnknown* publisher, std::string_view notification) const {
+  QelBaseUnknown* publisherImpl = publisher ? publisher->GetImpl() : nullptr;
+  return static_cast<int>(std::count_if(entries_.begin(), entries_.end(), [&](const Entry& entry) {
+    return !entry.removed && entry.publisher.GetRaw() == publisherImpl &&
+           (notification.empty() || entry.notification == notification);
+  }));
+}
+
+void QelCallbackManager::Compact() {
+  if (dispatchDepth_ > 0) return;  // indexes of a running dispatch must stay valid
+  std::erase_if(entries_, [](const Entry& entry) { return entry.removed || !entry.publisher.IsAlive(); });
+}
