@@ -1,0 +1,1 @@
+// Replaced by the service's first source file.
