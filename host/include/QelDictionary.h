@@ -43,6 +43,10 @@ class QelDictionary {
     QelExtensionCreator creator;
     std::string framework;
   };
+  // One line per entry ("<key> <interface> <framework>", "<late type> extension <class>",
+  // "component <name>"), for a person to see what a module registered.
+  std::vector<std::string> Describe(std::string_view framework = {}) const;
+
   // The extensions registered for a late type, in order of registration.
   std::vector<const ExtensionEntry*> ExtensionsOf(std::string_view lateType) const;
 

@@ -68,6 +68,19 @@ std::vector<const QelDictionary::ExtensionEntry*> QelDictionary::ExtensionsOf(st
   return found;
 }
 
+std::vector<std::string> QelDictionary::Describe(std::string_view framework) const {
+  std::vector<std::string> lines;
+  auto wanted = [&](const std::string& owner) { return framework.empty() || owner == framework; };
+  for (const auto& entry : factories_)
+    if (wanted(entry.framework)) lines.push_back(entry.key + " " + entry.iid.ToString() + " " + entry.framework);
+  for (const auto& entry : extensions_)
+    if (wanted(entry.framework))
+      lines.push_back(entry.lateType + " extension " + entry.extension->Name() + " " + entry.framework);
+  for (const auto& entry : named_)
+    if (wanted(entry.framework)) lines.push_back("component " + entry.name + " " + entry.framework);
+  return lines;
+}
+
 HRESULT QelInstantiateComponent(const char* name, const QelIID& iid, void** out) {
   if (!out) return E_UNEXPECTED;
   *out = nullptr;
