@@ -46,6 +46,10 @@ struct QelAssertionReport {
   std::string text;
 };
 
+// Hands a report to the innermost capture; false when none is active. The toolkit's check
+// routines (QelToolkitCheck.h) report through it too.
+bool QelCaptureReport(QelAssertionReport report);
+
 // While one exists, reports are recorded here instead of being logged or aborting:
 // tests count them by kind and detail. Captures nest; the innermost one records.
 class QelAssertionCapture {
@@ -61,7 +65,7 @@ class QelAssertionCapture {
   void Clear() { reports_.clear(); }
 
  private:
-  friend void QelAssertionFailed(const char*, const char*, const char*, int);
+  friend bool QelCaptureReport(QelAssertionReport report);
   std::vector<QelAssertionReport> reports_;
   QelAssertionCapture* outer_;
 };

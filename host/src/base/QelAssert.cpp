@@ -3,6 +3,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <utility>
 
 namespace {
 int g_developmentStage = -1;  // -1: not decided yet, read from the environment
@@ -24,15 +25,18 @@ std::string QelFormatAssertion(const char* kind, const char* detail, const char*
 void QelAssertionFailed(const char* kind, const char* detail, const char* file, int line) {
   const char* shortFile = BaseName(file ? file : "");
   std::string text = QelFormatAssertion(kind, detail, shortFile, line);
-  if (g_capture) {
-    g_capture->reports_.push_back({kind ? kind : "", detail ? detail : "", shortFile, line, text});
-    return;
-  }
+  if (QelCaptureReport({kind ? kind : "", detail ? detail : "", shortFile, line, text})) return;
   if (QelDevelopmentStage()) {
     std::fputs(text.c_str(), stderr);
     QelSysLogAbend(text.c_str());
   }
   QelSysLogError(text.c_str());
+}
+
+bool QelCaptureReport(QelAssertionReport report) {
+  if (!g_capture) return false;
+  g_capture->reports_.push_back(std::move(report));
+  return true;
 }
 
 bool QelDevelopmentStage() {
