@@ -1,0 +1,449 @@
+#include "QelSettingRepository.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <climits>
+#include <cmath>
+#include <cstring>
+#include <filesystem>
+#include <fstream>
+#include <map>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+#include "QelAssert.h"
+#include "QelCallbackManager.h"
+#include "QelMetaObject.h"
+#include "QelSettingNotif.h"
+#include "QelVar.h"
+
+namespace fs = std::filesystem;
+using json = nlohmann::json;
+
+namespace {
+
+// Owned references; the map outlives every static destructor on purpose, so a repository
+// lent to a late caller never disappears under it before ForgetRepositories.
+std::map<std::string, QelSettingRepository*>& Registry() {
+  static auto* registry = new std::map<std::string, QelSettingRepository*>;
+  return *registry;
+}
+
+std::function<bool()>& BeforeRenameHook() {
+  static auto* hook = new std::function<bool()>;
+  return *hook;
+}
+
+void LogError(const std::string& text) { QelSysLogError((text + "\n").c_str()); }
+
+std::string JsonPointer(const std::string& key) {
+  std::string out = "/";
+  for (char c : key) {
+    if (c == '~') out += "~0";
+    else if (c == '/') out += "~1";
+    else out += c;
+  }
+  return out;
+}
+
+bool IsScalar(const json& v) { return v.is_boolean() || v.is_number() || v.is_string(); }
+
+// Empty when `v` is something a setting may hold, else what is wrong with it.
+std::string ShapeError(const json& v) {
+  if (IsScalar(v)) return {};
+  if (v.is_array()) {
+    if (v.empty()) return "an array of settings may not be empty";
+    for (const auto& element : v)
+      if (!element.is_number()) return std::string("an array of settings holds numbers only, not ") + element.type_name();
+    return {};
+  }
+  return std::string("a setting is a number, a boolean, a text or an array of numbers, not ") + v.type_name();
+}
+
+bool AsInt(const json& v, int& out) {
+  if (v.is_number_unsigned()) {
+    auto u = v.get<uint64_t>();
+    if (u > static_cast<uint64_t>(INT_MAX)) return false;
+    out = static_cast<int>(u);
+    return true;
+  }
+  if (v.is_number_integer()) {
+    auto i = v.get<int64_t>();
+    if (i < INT_MIN || i > INT_MAX) return false;
+    out = static_cast<int>(i);
+    return true;
+  }
+  return false;
+}
+
+bool AsDouble(const json& v, double& out) {
+  if (!v.is_number()) return false;
+  out = v.get<double>();
+  return true;
+}
+
+bool WriteAll(int fd, const std::string& text) {
+  const char* p = text.data();
+  size_t left = text.size();
+  while (left > 0) {
+    ssize_t n = ::write(fd, p, left);
+    if (n < 0) {
+      if (errno == EINTR) continue;
+      return false;
+    }
+    p += n;
+    left -= static_cast<size_t>(n);
+  }
+  return true;
+}
+
+}  // namespace
+
+struct QelSettingRepository::State {
+  QelSettingRepository* self;
+  QelString name;
+  std::string path;
+  json values = json::object();
+  bool loaded = false;
+  bool modified = false;
+  // The file holds something that is not a settings file: it is moved aside, never
+  // overwritten, so whatever the user had there can still be recovered by hand.
+  bool corrupt = false;
+  // The file exists but could not be read: saving would replace settings never seen.
+  bool unreadable = false;
+
+  void Load();
+  const json* Find(const char* key);
+  HRESULT Store(const char* key, json value, int silent);
+  HRESULT MoveCorruptFileAside();
+};
+
+void QelSettingRepository::State::Load() {
+  if (loaded) return;
+  loaded = true;
+  std::error_code ec;
+  if (!fs::exists(path, ec)) {
+    if (ec) {
+      unreadable = true;
+      LogError("qel: settings file '" + path + "' cannot be reached (" + ec.message() + "); its settings are ignored");
+    }
+    return;
+  }
+  std::ifstream in(path, std::ios::binary);
+  std::ostringstream text;
+  text << in.rdbuf();
+  if (!in || in.bad()) {
+    unreadable = true;
+    LogError("qel: settings file '" + path + "' cannot be read (" + std::strerror(errno) +
+             "); its settings are ignored and it will not be overwritten");
+    return;
+  }
+  // An empty file is what `touch` leaves; it holds no settings and nothing to keep.
+  if (text.str().find_first_not_of(" \t\r\n") == std::string::npos) return;
+  const std::string aside = "; its settings are ignored and the file will be set aside at the next save";
+  json parsed;
+  try {
+    parsed = json::parse(text.str());
+  } catch (const json::parse_error& e) {
+    corrupt = true;
+    LogError("qel: settings file '" + path + "' is not valid JSON (at byte " + std::to_string(e.byte) + ": " +
+             e.what() + ")" + aside);
+    return;
+  }
+  if (!parsed.is_object()) {
+    corrupt = true;
+    LogError("qel: settings file '" + path + "': the top level must be a JSON object, not " + parsed.type_name() +
+             aside);
+    return;
+  }
+  for (const auto& [key, value] : parsed.items()) {
+    std::string why = ShapeError(value);
+    if (!why.empty()) {
+      corrupt = true;
+      LogError("qel: settings file '" + path + "' at " + JsonPointer(key) + ": " + why + aside);
+      return;
+    }
+  }
+  values = std::move(parsed);
+}
+
+const json* QelSettingRepository::State::Find(const char* key) {
+  if (!key || !*key) return nullptr;
+  Load();
+  auto it = values.find(key);
+  return it == values.end() ? nullptr : &*it;
+}
+
+HRESULT QelSettingRepository::State::Store(const char* key, json value, int silent) {
+  if (!key || !*key) return E_FAIL;
+  try {
+    // Texts that JSON cannot hold (bad UTF-8) are refused now rather than failing the save.
+    (void)json{{key, value}}.dump();
+    Load();
+    values[key] = std::move(value);
+  } catch (const std::exception&) {
+    return E_FAIL;
+  }
+  modified = true;
+  if (!silent) {
+    auto notification = QelVar<QelSettingNotif>::Adopt(new QelSettingNotif(QelString(key)));
+    QelCallbackManager::Get().Dispatch(self, kQelRepositoryModified, notification.get());
+  }
+  return S_OK;
+}
+
+HRESULT QelSettingRepository::State::MoveCorruptFileAside() {
+  std::error_code ec;
+  for (int n = 1; n < 10000; ++n) {
+    std::string aside = path + ".corrupt-" + std::to_string(n);
+    if (fs::exists(aside, ec)) continue;
+    if (::rename(path.c_str(), aside.c_str()) != 0 && errno != ENOENT) {
+      LogError("qel: settings not saved: the corrupt file '" + path + "' could not be moved to '" + aside + "' (" +
+               std::strerror(errno) + ")");
+      return E_FAIL;
+    }
+    LogError("qel: the corrupt settings file '" + path + "' was kept as '" + aside + "'");
+    corrupt = false;
+    return S_OK;
+  }
+  LogError("qel: settings not saved: too many corrupt copies of '" + path + "'");
+  return E_FAIL;
+}
+
+const QelMetaObject& QelSettingRepository::MetaObject() {
+  static const QelMetaObject& meta = QelMetaObject::Declare("QelSettingRepository", QelMetaKind::Implementation,
+                                                            &QelBaseUnknown::MetaObject(), "QelHost");
+  return meta;
+}
+
+QelSettingRepository::QelSettingRepository(const QelString& name, std::string folder)
+    : state_(std::make_unique<State>()) {
+  state_->self = this;
+  state_->name = name;
+  state_->path = (fs::path(folder) / (name.Str() + ".json")).string();
+}
+
+QelSettingRepository::~QelSettingRepository() = default;
+
+std::string QelSettingRepository::SettingsFolder() {
+  if (std::string dir = QelGetEnv("QEL_SETTINGS_DIR"); !dir.empty()) return dir;
+  // A relative XDG_CONFIG_HOME is invalid by the base-directory convention, so it is ignored.
+  if (std::string xdg = QelGetEnv("XDG_CONFIG_HOME"); !xdg.empty() && xdg[0] == '/') return xdg + "/qelrovfacets";
+  if (std::string home = QelGetEnv("HOME"); !home.empty()) return home + "/.config/qelrovfacets";
+  return "qelrovfacets";
+}
+
+QelSettingRepository* QelSettingRepository::GetRepository(const char* name, int reserved, int create,
+                                                          const char* folder) {
+  (void)reserved;
+  if (!name || !*name) return nullptr;
+  std::string_view n(name);
+  if (n.find('/') != std::string_view::npos || n == "." || n == "..") {
+    LogError(std::string("qel: '") + name + "' is not a settings repository name (it would leave the settings folder)");
+    return nullptr;
+  }
+  try {
+    std::string dir = folder && *folder ? folder : SettingsFolder();
+    std::string id = dir + '\n' + name;
+    auto& registry = Registry();
+    if (auto it = registry.find(id); it != registry.end()) return it->second;
+    std::error_code ec;
+    if (!create && !fs::exists(fs::path(dir) / (std::string(name) + ".json"), ec)) return nullptr;
+    auto* repository = new QelSettingRepository(QelString(name), dir);
+    registry.emplace(id, repository);
+    return repository;
+  } catch (const std::exception&) {
+    return nullptr;
+  }
+}
+
+void QelSettingRepository::ForgetRepositories() {
+  auto registry = std::move(Registry());
+  Registry().clear();
+  for (auto& [id, repository] : registry) repository->Release();
+}
+
+void QelSettingRepository::SetBeforeRenameHookForTesting(std::function<bool()> hook) {
+  BeforeRenameHook() = std::move(hook);
+}
+
+const QelString& QelSettingRepository::GetName() const { return state_->name; }
+const std::string& QelSettingRepository::GetFilePath() const { return state_->path; }
+bool QelSettingRepository::IsModified() const { return state_->modified; }
+
+int QelSettingRepository::IsPresent(const char* key, const char* type) {
+  const json* v = state_->Find(key);
+  if (!v) return 0;
+  std::string_view t = type ? type : "";
+  if (t.empty()) return 1;
+  if (t == "bool") return v->is_boolean();
+  if (t == "string") return v->is_string();
+  if (t != "int" && t != "double") return 0;
+  const json single = json::array({*v});
+  for (const auto& element : v->is_array() ? *v : single) {
+    int i;
+    if (t == "int" ? !AsInt(element, i) : !element.is_number()) return 0;
+  }
+  return 1;
+}
+
+HRESULT QelSettingRepository::ReadSetting(const char* key, int& value) {
+  const json* v = state_->Find(key);
+  if (!v) return E_FAIL;
+  return AsInt(v->is_array() ? v->front() : *v, value) ? S_OK : E_FAIL;
+}
+
+HRESULT QelSettingRepository::ReadSetting(const char* key, double& value) {
+  const json* v = state_->Find(key);
+  if (!v) return E_FAIL;
+  return AsDouble(v->is_array() ? v->front() : *v, value) ? S_OK : E_FAIL;
+}
+
+HRESULT QelSettingRepository::ReadSetting(const char* key, bool& value) {
+  const json* v = state_->Find(key);
+  if (!v || !v->is_boolean()) return E_FAIL;
+  value = v->get<bool>();
+  return S_OK;
+}
+
+HRESULT QelSettingRepository::ReadSetting(const char* key, QelString& value) {
+  const json* v = state_->Find(key);
+  if (!v || !v->is_string()) return E_FAIL;
+  value = QelString(v->get<std::string>());
+  return S_OK;
+}
+
+HRESULT QelSettingRepository::ReadSetting(const char* key, int* values, int count) {
+  const json* v = state_->Find(key);
+  if (!v || !values || count <= 0) return E_FAIL;
+  const json single = json::array({*v});
+  const json& all = v->is_array() ? *v : single;
+  if (static_cast<int>(all.size()) < count) return E_FAIL;
+  std::vector<int> read(static_cast<size_t>(count));
+  for (int i = 0; i < count; ++i)
+    if (!AsInt(all[static_cast<size_t>(i)], read[static_cast<size_t>(i)])) return E_FAIL;
+  std::copy(read.begin(), read.end(), values);
+  return S_OK;
+}
+
+HRESULT QelSettingRepository::ReadSetting(const char* key, double* values, int count) {
+  const json* v = state_->Find(key);
+  if (!v || !values || count <= 0) return E_FAIL;
+  const json single = json::array({*v});
+  const json& all = v->is_array() ? *v : single;
+  if (static_cast<int>(all.size()) < count) return E_FAIL;
+  std::vector<double> read(static_cast<size_t>(count));
+  for (int i = 0; i < count; ++i)
+    if (!AsDouble(all[static_cast<size_t>(i)], read[static_cast<size_t>(i)])) return E_FAIL;
+  std::copy(read.begin(), read.end(), values);
+  return S_OK;
+}
+
+HRESULT QelSettingRepository::WriteSetting(const char* key, int value, int silent) {
+  return state_->Store(key, json(value), silent);
+}
+
+HRESULT QelSettingRepository::WriteSetting(const char* key, double value, int silent) {
+  // JSON has no infinity or NaN: stored, they would come back as null and spoil the file.
+  if (!std::isfinite(value)) return E_FAIL;
+  return state_->Store(key, json(value), silent);
+}
+
+HRESULT QelSettingRepository::WriteSetting(const char* key, bool value, int silent) {
+  return state_->Store(key, json(value), silent);
+}
+
+HRESULT QelSettingRepository::WriteSetting(const char* key, const char* value, int silent) {
+  if (!value) return E_FAIL;
+  return state_->Store(key, json(std::string(value)), silent);
+}
+
+HRESULT QelSettingRepository::WriteSetting(const char* key, const QelString& value, int silent) {
+  return state_->Store(key, json(value.Str()), silent);
+}
+
+HRESULT QelSettingRepository::WriteSetting(const char* key, const int* values, int count, int silent) {
+  if (!values || count <= 0) return E_FAIL;
+  if (count == 1) return WriteSetting(key, values[0], silent);
+  return state_->Store(key, json(std::vector<int>(values, values + count)), silent);
+}
+
+HRESULT QelSettingRepository::WriteSetting(const char* key, const double* values, int count, int silent) {
+  if (!values || count <= 0) return E_FAIL;
+  for (int i = 0; i < count; ++i)
+    if (!std::isfinite(values[i])) return E_FAIL;
+  if (count == 1) return WriteSetting(key, values[0], silent);
+  return state_->Store(key, json(std::vector<double>(values, values + count)), silent);
+}
+
+HRESULT QelSettingRepository::RemoveSetting(const char* key, int silent) {
+  if (!state_->Find(key)) return S_FALSE;
+  state_->values.erase(key);
+  state_->modified = true;
+  if (!silent) {
+    auto notification = QelVar<QelSettingNotif>::Adopt(new QelSettingNotif(QelString(key)));
+    QelCallbackManager::Get().Dispatch(this, kQelRepositoryModified, notification.get());
+  }
+  return S_OK;
+}
+
+HRESULT QelSettingRepository::SaveRepository(const char* path) {
+  State& s = *state_;
+  try {
+    s.Load();
+    const std::string target = path && *path ? std::string(path) : s.path;
+    const bool own = target == s.path;
+    if (own && !s.modified) return S_OK;
+    if (own && s.unreadable) {
+      LogError("qel: settings not saved: '" + target + "' could not be read, and saving would replace it");
+      return E_FAIL;
+    }
+    std::error_code ec;
+    fs::path folder = fs::path(target).parent_path();
+    if (!folder.empty()) fs::create_directories(folder, ec);
+    if (ec) {
+      LogError("qel: settings not saved: the folder '" + folder.string() + "' cannot be made (" + ec.message() + ")");
+      return E_FAIL;
+    }
+    if (own && s.corrupt && s.MoveCorruptFileAside() != S_OK) return E_FAIL;
+
+    const std::string text = s.values.dump(2) + "\n";
+    // The temporary sits in the target's folder so that the rename stays on one file system
+    // and therefore replaces the old file in one step.
+    const std::string temporary = target + ".tmp-" + std::to_string(::getpid());
+    int fd = ::open(temporary.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
+    if (fd < 0) {
+      LogError("qel: settings not saved: '" + temporary + "' cannot be created (" + std::strerror(errno) + ")");
+      return E_FAIL;
+    }
+    bool written = WriteAll(fd, text) && ::fsync(fd) == 0;
+    int writeErrno = errno;
+    written = ::close(fd) == 0 && written;
+    if (!written) {
+      ::unlink(temporary.c_str());
+      LogError("qel: settings not saved: writing '" + temporary + "' failed (" + std::strerror(writeErrno) + ")");
+      return E_FAIL;
+    }
+    if (auto& hook = BeforeRenameHook(); hook && !hook()) return E_FAIL;
+    if (::rename(temporary.c_str(), target.c_str()) != 0) {
+      int renameErrno = errno;
+      ::unlink(temporary.c_str());
+      LogError("qel: settings not saved: '" + temporary + "' could not replace '" + target + "' (" +
+               std::strerror(renameErrno) + ")");
+      return E_FAIL;
+    }
+    // Without syncing the folder the rename itself could be lost in a power cut.
+    int dirFd = ::open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    if (dirFd >= 0) {
+      ::fsync(dirFd);
+      ::close(dirFd);
+    }
+    if (own) s.modified = false;
+    return S_OK;
+  } catch (const std::exception& e) {
+    LogError("qel: settings not saved to '" + s.path + "': " + e.what());
+    return E_FAIL;
+  }
+}

@@ -1,0 +1,307 @@
+#include "QelSettingRepository.h"
+
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <cstdio>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+#include "QelCallbackManager.h"
+#include "QelSettingNotif.h"
+
+namespace fs = std::filesystem;
+
+namespace {
+
+std::string ReadFile(const fs::path& path) {
+  std::ifstream in(path, std::ios::binary);
+  std::ostringstream text;
+  text << in.rdbuf();
+  return text.str();
+}
+
+void WriteFile(const fs::path& path, const std::string& text) {
+  std::ofstream out(path, std::ios::binary | std::ios::trunc);
+  out << text;
+}
+
+class SettingRepositoryTest : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    char pattern[] = "/tmp/qel-settings-XXXXXX";
+    ASSERT_NE(::mkdtemp(pattern), nullptr);
+    folder_ = pattern;
+    liveBefore_ = QelBaseUnknown::LiveObjectCount();
+  }
+  void TearDown() override {
+    QelSettingRepository::SetBeforeRenameHookForTesting({});
+    QelSettingRepository::ForgetRepositories();
+    EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), liveBefore_);
+    fs::remove_all(folder_);
+  }
+
+  QelSettingRepository* Repo(const char* name = "QelRovDataFiltering") {
+    return QelSettingRepository::GetRepository(name, 0, 1, folder_.c_str());
+  }
+  fs::path FileOf(const char* name = "QelRovDataFiltering") { return fs::path(folder_) / (std::string(name) + ".json"); }
+
+  // Runs the probe as a new process: what another program sees in the file.
+  std::string Probe(const char* key, const char* type, const char* name = "QelRovDataFiltering") {
+    std::string command = std::string(QEL_SETTINGS_PROBE) + " " + folder_ + " " + name + " " + key + " " + type;
+    FILE* pipe = ::popen(command.c_str(), "r");
+    if (!pipe) return "popen failed";
+    std::string out;
+    char buffer[256];
+    while (std::fgets(buffer, sizeof buffer, pipe)) out += buffer;
+    ::pclose(pipe);
+    if (!out.empty() && out.back() == '\n') out.pop_back();
+    return out;
+  }
+
+  std::string folder_;
+  int64_t liveBefore_ = 0;
+};
+
+TEST_F(SettingRepositoryTest, SavedSettingsAreReadBackByAnotherProcess) {
+  QelSettingRepository* repo = Repo();
+  ASSERT_NE(repo, nullptr);
+  ASSERT_EQ(repo->WriteSetting("DataFilteringPanel_TPSCfg", 1), S_OK);
+  ASSERT_EQ(repo->WriteSetting("Tolerance", 0.125), S_OK);
+  ASSERT_EQ(repo->WriteSetting("Expanded", true), S_OK);
+  ASSERT_EQ(repo->WriteSetting("Label", "Ébauche \"v2\""), S_OK);
+  EXPECT_EQ(Probe("DataFilteringPanel_TPSCfg", "int"), "absent") << "nothing reaches the file before a save";
+
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_FALSE(repo->IsModified());
+  EXPECT_EQ(Probe("DataFilteringPanel_TPSCfg", "int"), "1");
+  EXPECT_EQ(Probe("Tolerance", "double"), "0.125");
+  EXPECT_EQ(Probe("Expanded", "bool"), "true");
+  EXPECT_EQ(Probe("Label", "string"), "Ébauche \"v2\"");
+  EXPECT_EQ(Probe("Tolerance", "int"), "absent") << "a double is not an int";
+  EXPECT_TRUE(fs::directory_iterator(folder_) != fs::directory_iterator());
+  for (const auto& entry : fs::directory_iterator(folder_))
+    EXPECT_EQ(entry.path().filename(), "QelRovDataFiltering.json") << "no temporary left behind";
+}
+
+TEST_F(SettingRepositoryTest, SaveCreatesAMissingFolderAndWritesOnlyWhenModified) {
+  std::string nested = folder_ + "/a/b";
+  QelSettingRepository* repo = QelSettingRepository::GetRepository("Prefs", 0, 1, nested.c_str());
+  ASSERT_NE(repo, nullptr);
+  EXPECT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_FALSE(fs::exists(nested)) << "an unchanged repository writes nothing";
+  repo->WriteSetting("k", 3);
+  EXPECT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_EQ(nlohmann::json::parse(ReadFile(nested + "/Prefs.json"))["k"], 3);
+}
+
+TEST_F(SettingRepositoryTest, OneRepositoryPerNameAndCreateZeroFindsOnlyExistingOnes) {
+  EXPECT_EQ(QelSettingRepository::GetRepository("Absent", 0, 0, folder_.c_str()), nullptr);
+  QelSettingRepository* repo = Repo();
+  EXPECT_EQ(Repo(), repo);
+  EXPECT_NE(Repo("Other"), repo);
+  EXPECT_EQ(QelSettingRepository::GetRepository("QelRovDataFiltering", 0, 0, folder_.c_str()), repo);
+  EXPECT_EQ(QelSettingRepository::GetRepository("", 0, 1, folder_.c_str()), nullptr);
+  testing::internal::CaptureStderr();
+  EXPECT_EQ(QelSettingRepository::GetRepository("../escape", 0, 1, folder_.c_str()), nullptr);
+  EXPECT_NE(testing::internal::GetCapturedStderr().find("../escape"), std::string::npos);
+}
+
+TEST_F(SettingRepositoryTest, ReadsCheckTheTypeAndLeaveTheValueAloneOnFailure) {
+  QelSettingRepository* repo = Repo();
+  repo->WriteSetting("n", 7);
+  repo->WriteSetting("x", 2.5);
+  repo->WriteSetting("s", QelString("text"));
+  const int pair[] = {4, 5};
+  repo->WriteSetting("pair", pair, 2);
+
+  EXPECT_TRUE(repo->IsPresent("n", "int"));
+  EXPECT_TRUE(repo->IsPresent("n", "double")) << "an int reads as a double";
+  EXPECT_FALSE(repo->IsPresent("x", "int"));
+  EXPECT_FALSE(repo->IsPresent("s", "bool"));
+  EXPECT_FALSE(repo->IsPresent("n", "float")) << "unknown type names match nothing";
+  EXPECT_TRUE(repo->IsPresent("s", nullptr));
+  EXPECT_FALSE(repo->IsPresent("missing", "int"));
+
+  int value = -1;
+  EXPECT_EQ(repo->ReadSetting("x", value), E_FAIL);
+  EXPECT_EQ(repo->ReadSetting("missing", value), E_FAIL);
+  EXPECT_EQ(value, -1);
+  double real = 0;
+  EXPECT_EQ(repo->ReadSetting("n", real), S_OK);
+  EXPECT_EQ(real, 7.0);
+  QelString text;
+  EXPECT_EQ(repo->ReadSetting("n", text), E_FAIL);
+  EXPECT_EQ(repo->ReadSetting("s", text), S_OK);
+  EXPECT_EQ(text, QelString("text"));
+
+  int got[3] = {0, 0, 0};
+  EXPECT_EQ(repo->ReadSetting("pair", got, 2), S_OK);
+  EXPECT_EQ(got[0], 4);
+  EXPECT_EQ(got[1], 5);
+  EXPECT_EQ(repo->ReadSetting("pair", got, 3), E_FAIL) << "fewer values than asked";
+  EXPECT_EQ(repo->ReadSetting("n", got, 1), S_OK) << "a single value is an array of one";
+  EXPECT_EQ(got[0], 7);
+}
+
+TEST_F(SettingRepositoryTest, ValuesJsonCannotHoldAreRefusedSoTheFileStaysLoadable) {
+  QelSettingRepository* repo = Repo();
+  EXPECT_EQ(repo->WriteSetting("inf", 1.0 / 0.0), E_FAIL);
+  const double withNan[] = {1.0, std::nan("")};
+  EXPECT_EQ(repo->WriteSetting("nan", withNan, 2), E_FAIL);
+  EXPECT_EQ(repo->WriteSetting("bad", "\xff\xfe"), E_FAIL);
+  EXPECT_EQ(repo->WriteSetting("", 1), E_FAIL);
+  EXPECT_EQ(repo->WriteSetting(nullptr, 1), E_FAIL);
+  EXPECT_FALSE(repo->IsModified());
+}
+
+TEST_F(SettingRepositoryTest, HugeIntegersInAHandEditedFileDoNotReadAsInt) {
+  WriteFile(FileOf(), R"({"big": 9999999999, "neg": -3})");
+  QelSettingRepository* repo = Repo();
+  int value = 0;
+  EXPECT_FALSE(repo->IsPresent("big", "int"));
+  EXPECT_EQ(repo->ReadSetting("big", value), E_FAIL);
+  EXPECT_EQ(repo->ReadSetting("neg", value), S_OK);
+  EXPECT_EQ(value, -3);
+}
+
+TEST_F(SettingRepositoryTest, CrashBetweenWriteAndRenameLeavesTheOldFileIntact) {
+  QelSettingRepository* repo = Repo();
+  repo->WriteSetting("DataFilteringPanel_LumReview", 1);
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  const std::string before = ReadFile(FileOf());
+
+  repo->WriteSetting("DataFilteringPanel_LumReview", 0);
+  QelSettingRepository::SetBeforeRenameHookForTesting([] { return false; });
+  EXPECT_EQ(repo->SaveRepository(), E_FAIL);
+  EXPECT_EQ(ReadFile(FileOf()), before);
+  EXPECT_EQ(Probe("DataFilteringPanel_LumReview", "int"), "1");
+  EXPECT_TRUE(repo->IsModified()) << "the change is still pending";
+
+  QelSettingRepository::SetBeforeRenameHookForTesting({});
+  EXPECT_EQ(repo->SaveRepository(), S_OK) << "a later save overwrites the stale temporary";
+  EXPECT_EQ(Probe("DataFilteringPanel_LumReview", "int"), "0");
+}
+
+TEST_F(SettingRepositoryTest, ProcessKilledBeforeRenameLeavesTheOldFileIntact) {
+  QelSettingRepository* repo = Repo();
+  repo->WriteSetting("v", 1);
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  const std::string before = ReadFile(FileOf());
+
+  pid_t child = ::fork();
+  ASSERT_GE(child, 0);
+  if (child == 0) {
+    QelSettingRepository::SetBeforeRenameHookForTesting([]() -> bool { ::_exit(42); });
+    repo->WriteSetting("v", 2, 1);
+    repo->SaveRepository();
+    ::_exit(0);
+  }
+  int status = 0;
+  ASSERT_EQ(::waitpid(child, &status, 0), child);
+  ASSERT_TRUE(WIFEXITED(status));
+  EXPECT_EQ(WEXITSTATUS(status), 42) << "the child died inside the save";
+  EXPECT_EQ(ReadFile(FileOf()), before);
+  EXPECT_EQ(Probe("v", "int"), "1");
+}
+
+TEST_F(SettingRepositoryTest, CorruptFileIsReportedReadsEmptyAndIsSetAsideNotOverwritten) {
+  const std::string garbage = "{\n  \"DataFilteringPanel_TPSCfg\": 1,\n  oops\n}\n";
+  WriteFile(FileOf(), garbage);
+  testing::internal::CaptureStderr();
+  QelSettingRepository* repo = Repo();
+  EXPECT_FALSE(repo->IsPresent("DataFilteringPanel_TPSCfg", "int"));
+  EXPECT_FALSE(repo->IsPresent("anything"));
+  const std::string report = testing::internal::GetCapturedStderr();
+  EXPECT_NE(report.find(FileOf().string()), std::string::npos) << report;
+  EXPECT_NE(report.find("byte"), std::string::npos) << report;
+  EXPECT_EQ(std::count(report.begin(), report.end(), '\n'), 1) << "one warning, not one per read: " << report;
+  EXPECT_EQ(ReadFile(FileOf()), garbage) << "reading never touches the file";
+
+  repo->WriteSetting("DataFilteringPanel_TPSCfg", 0);
+  testing::internal::CaptureStderr();
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  testing::internal::GetCapturedStderr();
+  EXPECT_EQ(ReadFile(FileOf().string() + ".corrupt-1"), garbage);
+  EXPECT_EQ(Probe("DataFilteringPanel_TPSCfg", "int"), "0");
+}
+
+TEST_F(SettingRepositoryTest, WrongShapeNamesTheJsonPathAndASecondCorruptionGetsTheNextNumber) {
+  WriteFile(FileOf().string() + ".corrupt-1", "older");
+  WriteFile(FileOf(), R"({"ok": 1, "a/b": {"nested": true}})");
+  testing::internal::CaptureStderr();
+  QelSettingRepository* repo = Repo();
+  EXPECT_FALSE(repo->IsPresent("ok"));
+  const std::string report = testing::internal::GetCapturedStderr();
+  EXPECT_NE(report.find("/a~1b"), std::string::npos) << report;
+
+  repo->WriteSetting("ok", 2);
+  testing::internal::CaptureStderr();
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  testing::internal::GetCapturedStderr();
+  EXPECT_EQ(ReadFile(FileOf().string() + ".corrupt-1"), "older");
+  EXPECT_NE(ReadFile(FileOf().string() + ".corrupt-2").find("nested"), std::string::npos);
+}
+
+TEST_F(SettingRepositoryTest, TopLevelThatIsNotAnObjectIsCorruptButAnEmptyFileIsNot) {
+  WriteFile(FileOf("List"), "[1, 2]");
+  WriteFile(FileOf("Empty"), "\n");
+  testing::internal::CaptureStderr();
+  EXPECT_FALSE(Repo("List")->IsPresent("x"));
+  EXPECT_FALSE(Repo("Empty")->IsPresent("x"));
+  const std::string report = testing::internal::GetCapturedStderr();
+  EXPECT_NE(report.find("List.json"), std::string::npos) << report;
+  EXPECT_EQ(report.find("Empty.json"), std::string::npos) << report;
+}
+
+TEST_F(SettingRepositoryTest, RepositoryModifiedCarriesTheSettingName) {
+  QelSettingRepository* repo = Repo();
+  std::vector<std::string> names;
+  QelBaseUnknown* publisherSeen = nullptr;
+  QelCallbackId id = QelCallbackManager::Get().AddCallback(
+      repo, kQelRepositoryModified, nullptr, [&](QelBaseUnknown* publisher, QelBaseUnknown* notification) {
+        publisherSeen = publisher;
+        QelVar<QelSettingNotif> notif = notification;
+        names.push_back(notif ? notif->GetName().Str() : "<not a QelSettingNotif>");
+        int value = -1;
+        // Subscribers see the new value already stored.
+        if (notif) static_cast<QelSettingRepository*>(publisher)->ReadSetting(notif->GetName().CastToCharPtr(), value);
+        names.back() += "=" + std::to_string(value);
+      });
+  const int zero = 0;
+  repo->WriteSetting("DataFilteringPanel_TPSCfg", &zero, 1, 0);
+  repo->WriteSetting("Quiet", 5, 1);
+  repo->RemoveSetting("DataFilteringPanel_TPSCfg");
+  EXPECT_EQ(publisherSeen, repo);
+  EXPECT_EQ(names, (std::vector<std::string>{"DataFilteringPanel_TPSCfg=0", "DataFilteringPanel_TPSCfg=-1"}));
+  QelCallbackManager::Get().RemoveCallback(id);
+}
+
+TEST(SettingsFolderTest, FollowsTheEnvironmentInOrder) {
+  auto keep = [](const char* name) -> std::optional<std::string> {
+    const char* v = std::getenv(name);
+    return v ? std::optional<std::string>(v) : std::nullopt;
+  };
+  auto restore = [](const char* name, const std::optional<std::string>& v) {
+    if (v) ::setenv(name, v->c_str(), 1);
+    else ::unsetenv(name);
+  };
+  auto dir = keep("QEL_SETTINGS_DIR"), xdg = keep("XDG_CONFIG_HOME"), home = keep("HOME");
+  ::setenv("QEL_SETTINGS_DIR", "/s", 1);
+  ::setenv("XDG_CONFIG_HOME", "/x", 1);
+  ::setenv("HOME", "/h", 1);
+  EXPECT_EQ(QelSettingRepository::SettingsFolder(), "/s");
+  ::unsetenv("QEL_SETTINGS_DIR");
+  EXPECT_EQ(QelSettingRepository::SettingsFolder(), "/x/qelrovfacets");
+  ::setenv("XDG_CONFIG_HOME", "relative", 1);
+  EXPECT_EQ(QelSettingRepository::SettingsFolder(), "/h/.config/qelrovfacets");
+  restore("QEL_SETTINGS_DIR", dir);
+  restore("XDG_CONFIG_HOME", xdg);
+  restore("HOME", home);
+}
+
+}  // namespace
