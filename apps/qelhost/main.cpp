@@ -2,7 +2,12 @@
 // product model, loads the QelRovFacets plug-in and shows what a reviewer would see.
 #include <cstdio>
 #include <cstring>
+#include <iostream>
 #include <string>
+
+#include "QelModelLoader.h"
+#include "QelModelPrinter.h"
+#include "QelSampleProduct.h"
 
 namespace {
 const char kUsage[] =
@@ -17,6 +22,7 @@ const char kUsage[] =
 }  // namespace
 
 int main(int argc, char** argv) {
+  std::string modelPath;
   for (int i = 1; i < argc; ++i) {
     std::string arg = argv[i];
     if (arg == "-h" || arg == "--help") {
@@ -31,6 +37,22 @@ int main(int argc, char** argv) {
       std::fprintf(stderr, "qelhost: unknown option '%s'\n%s", arg.c_str(), kUsage);
       return 2;
     }
+    if (!modelPath.empty()) {
+      std::fprintf(stderr, "qelhost: only one model file may be given\n%s", kUsage);
+      return 2;
+    }
+    modelPath = arg;
   }
+
+  QelBaseUnknown_var root;
+  std::string error;
+  HRESULT loaded = modelPath.empty()
+                       ? QelModelLoader::LoadText(kQelSampleProductText, kQelSampleProductName, root, error)
+                       : QelModelLoader::LoadFile(modelPath, root, error);
+  if (loaded != S_OK) {
+    std::fprintf(stderr, "qelhost: %s\n", error.c_str());
+    return 1;
+  }
+  QelModelPrinter::Print(root.get(), std::cout);
   return 0;
 }

@@ -36,6 +36,11 @@ class QelBaseUnknown {
   // `out` when the object has none.
   virtual HRESULT QueryInterface(const QelIID& iid, void** out);
 
+  // What QueryInterface would answer for an interface the object's own class implements,
+  // but borrowed (no reference) and without the dictionary: for hot paths over objects the
+  // caller already holds. Null when the class itself does not answer `iid`.
+  void* FindOwnInterface(const QelIID& iid) { return QueryDirect(iid); }
+
   // The object that really implements: a tie answers its implementation, others themselves.
   virtual QelBaseUnknown* GetImpl();
 

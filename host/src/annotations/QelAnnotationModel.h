@@ -1,0 +1,36 @@
+#pragma once
+// QelAnnotationModel: the annotation data of one product model: its annotation sets in
+// model order. Owned by the root product occurrence; it sees the root weakly, so the root
+// and its data never keep each other alive.
+#include <string>
+#include <vector>
+
+#include "QelBaseUnknown_WR.h"
+
+class QelLumAnnotationSet;
+class QelPLMProductOccurrence;
+
+class QelAnnotationModel : public QelBaseUnknown {
+ public:
+  explicit QelAnnotationModel(QelPLMProductOccurrence* root);
+
+  static const QelMetaObject& MetaObject();
+  const QelMetaObject* GetMetaObject() const override;
+
+  // The model of any object of it (root, product, set, annotation...), or null.
+  static QelAnnotationModel* Of(QelBaseUnknown* object);
+
+  QelPLMProductOccurrence* Root() const;
+  const std::vector<QelVar<QelLumAnnotationSet>>& Sets() const { return sets_; }
+  void AddSet(QelLumAnnotationSet* set);
+  const std::string& SourceName() const { return sourceName_; }
+  void SetSourceName(std::string name) { sourceName_ = std::move(name); }
+
+ protected:
+  ~QelAnnotationModel() override;
+
+ private:
+  QelBaseUnknown_WR root_;
+  std::vector<QelVar<QelLumAnnotationSet>> sets_;
+  std::string sourceName_;
+};

@@ -1,1 +1,0 @@
-// Replaced by the service's first source file.

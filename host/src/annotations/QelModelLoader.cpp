@@ -1,0 +1,426 @@
+#include "QelModelLoader.h"
+
+#include <fstream>
+#include <initializer_list>
+#include <sstream>
+#include <stdexcept>
+#include <string_view>
+#include <unordered_map>
+
+#include <nlohmann/json.hpp>
+
+#include "QelModelBuilder.h"
+#include "QelTPSTypeClassifier.h"
+
+namespace {
+using Json = nlohmann::json;
+
+// A position in the document, formatted only when something is wrong.
+struct Where {
+  const Where* parent = nullptr;
+  const char* key = nullptr;
+  int index = -1;
+
+  Where Key(const char* k) const { return Where{this, k, -1}; }
+  Where At(int i) const { return Where{this, nullptr, i}; }
+  std::string Text() const {
+    std::string head = parent ? parent->Text() : "$";
+    if (key) return head + "." + key;
+    if (index >= 0) return head + "[" + std::to_string(index) + "]";
+    return head;
+  }
+};
+
+struct Refused : std::runtime_error {
+  Refused(const Where& where, const std::string& what) : std::runtime_error(where.Text() + ": " + what) {}
+};
+
+const char* TypeName(const Json& j) { return j.type_name(); }
+
+const Json& Require(const Json& object, const char* key, const Where& where) {
+  auto it = object.find(key);
+  if (it == object.end()) throw Refused(where, std::string("missing key '") + key + "'");
+  return *it;
+}
+
+void CheckKeys(const Json& object, const Where& where, std::initializer_list<std::string_view> allowed) {
+  for (auto it = object.begin(); it != object.end(); ++it) {
+    bool known = false;
+    for (std::string_view k : allowed) known = known || it.key() == k;
+    if (!known) throw Refused(where, "unknown key '" + it.key() + "'");
+  }
+}
+
+const Json& Object(const Json& j, const Where& where) {
+  if (!j.is_object()) throw Refused(where, std::string("expected an object, found ") + TypeName(j));
+  return j;
+}
+
+const Json& Array(const Json& j, const Where& where) {
+  if (!j.is_array()) throw Refused(where, std::string("expected an array, found ") + TypeName(j));
+  return j;
+}
+
+std::string String(const Json& j, const Where& where) {
+  if (!j.is_string()) throw Refused(where, std::string("expected a string, found ") + TypeName(j));
+  return j.get<std::string>();
+}
+
+bool Bool(const Json& j, const Where& where) {
+  if (!j.is_boolean()) throw Refused(where, std::string("expected true or false, found ") + TypeName(j));
+  return j.get<bool>();
+}
+
+double Number(const Json& j, const Where& where) {
+  if (!j.is_number()) throw Refused(where, std::string("expected a number, found ") + TypeName(j));
+  return j.get<double>();
+}
+
+int Integer(const Json& j, const Where& where) {
+  if (!j.is_number_integer()) throw Refused(where, std::string("expected an integer, found ") + TypeName(j));
+  return j.get<int>();
+}
+
+QelMathVector Vector(const Json& j, const Where& where) {
+  if (!j.is_array() || j.size() != 3) throw Refused(where, "expected an array of 3 numbers");
+  return {Number(j[0], where.At(0)), Number(j[1], where.At(1)), Number(j[2], where.At(2))};
+}
+
+std::string OptString(const Json& o, const char* key, const Where& where, std::string fallback) {
+  auto it = o.find(key);
+  return it == o.end() ? fallback : String(*it, where.Key(key));
+}
+
+bool OptBool(const Json& o, const char* key, const Where& where, bool fallback) {
+  auto it = o.find(key);
+  return it == o.end() ? fallback : Bool(*it, where.Key(key));
+}
+
+class Loader {
+ public:
+  explicit Loader(QelModelBuilder& builder) : builder_(builder) {}
+
+  // The root's own attributes, read before the builder exists.
+  static QelModelProductDesc RootDesc(const Json& doc) {
+    Where top;
+    Object(doc, top);
+    if (String(Require(doc, "format", top), top.Key("format")) != "qel-product-model") {
+      throw Refused(top.Key("format"), "expected \"qel-product-model\"");
+    }
+    Where at = top.Key("root");
+    const Json& root = Object(Require(doc, "root", top), at);
+    return QelModelProductDesc{.alias = OptString(root, "alias", at, "Root"),
+                               .icon = OptString(root, "icon", at, "I_Product"),
+                               .shown = OptBool(root, "shown", at, true),
+                               .lightLoadMode = OptBool(root, "lightLoadMode", at, false)};
+  }
+
+  void Load(const Json& doc) {
+    Where top;
+    CheckKeys(doc, top, {"format", "version", "root", "sets"});
+    if (String(Require(doc, "format", top), top.Key("format")) != "qel-product-model") {
+      throw Refused(top.Key("format"), "expected \"qel-product-model\"");
+    }
+    if (Integer(Require(doc, "version", top), top.Key("version")) != 1) {
+      throw Refused(top.Key("version"), "unsupported version (this host reads version 1)");
+    }
+    Where rootAt = top.Key("root");
+    const Json& root = Object(Require(doc, "root", top), rootAt);
+    Product(root, rootAt, builder_.Root().get());
+    auto it = doc.find("sets");
+    if (it == doc.end()) return;
+    Where setsAt = top.Key("sets");
+    const Json& sets = Array(*it, setsAt);
+    for (size_t i = 0; i < sets.size(); ++i) Set(sets[i], setsAt.At(static_cast<int>(i)));
+  }
+
+ private:
+  enum class Kind { Product, Rep, Set, Annotation, View, Capture };
+  struct Entry {
+    QelBaseUnknown_var object;
+    Kind kind;
+  };
+
+  void Declare(const Json& object, const Where& where, QelBaseUnknown* made, Kind kind) {
+    Where idAt = where.Key("id");
+    std::string id = String(Require(object, "id", where), idAt);
+    if (id.empty()) throw Refused(idAt, "empty identifier");
+    if (!ids_.emplace(id, Entry{QelBaseUnknown_var(made), kind}).second) {
+      throw Refused(idAt, "duplicate identifier '" + id + "'");
+    }
+  }
+
+  QelBaseUnknown* Lookup(const Json& ref, const Where& where, Kind kind, const char* what) {
+    std::string id = String(ref, where);
+    auto it = ids_.find(id);
+    if (it == ids_.end()) throw Refused(where, std::string("unknown ") + what + " '" + id + "'");
+    if (it->second.kind != kind) throw Refused(where, "'" + id + "' is not a " + what);
+    return it->second.object.get();
+  }
+
+  void Product(const Json& p, const Where& where, QelBaseUnknown* made) {
+    CheckKeys(p, where, {"id", "alias", "icon", "shown", "lightLoadMode", "reps", "children"});
+    Declare(p, where, made, Kind::Product);
+    if (auto it = p.find("reps"); it != p.end()) {
+      Where repsAt = where.Key("reps");
+      const Json& reps = Array(*it, repsAt);
+      for (size_t i = 0; i < reps.size(); ++i) {
+        Where at = repsAt.At(static_cast<int>(i));
+        const Json& r = Object(reps[i], at);
+        CheckKeys(r, at, {"id", "alias", "reference", "icon"});
+        QelModelRepInstanceDesc desc{.alias = OptString(r, "alias", at, ""),
+                                     .referenceAlias = OptString(r, "reference", at, ""),
+                                     .icon = OptString(r, "icon", at, "I_RepInstance")};
+        Declare(r, at, builder_.AddRepInstance(made, desc).get(), Kind::Rep);
+      }
+    }
+    if (auto it = p.find("children"); it != p.end()) {
+      Where childrenAt = where.Key("children");
+      const Json& children = Array(*it, childrenAt);
+      for (size_t i = 0; i < children.size(); ++i) {
+        Where at = childrenAt.At(static_cast<int>(i));
+        const Json& c = Object(children[i], at);
+        QelModelProductDesc desc{.alias = OptString(c, "alias", at, ""),
+                                 .icon = OptString(c, "icon", at, "I_Product"),
+                                 .shown = OptBool(c, "shown", at, true),
+                                 .lightLoadMode = OptBool(c, "lightLoadMode", at, false)};
+        QelBaseUnknown_var child = builder_.AddProduct(made, desc);
+        Product(c, at, child.get());
+      }
+    }
+  }
+
+  void Set(const Json& j, const Where& where) {
+    const Json& s = Object(j, where);
+    CheckKeys(s, where, {"id", "alias", "icon", "owner", "rep", "light", "kind", "rootSet", "shown", "annotations",
+                         "views", "captures", "otherElements"});
+    QelModelSetDesc desc{.alias = OptString(s, "alias", where, ""), .icon = OptString(s, "icon", where, "I_AnnotationSet")};
+    QelBaseUnknown* owner = Lookup(Require(s, "owner", where), where.Key("owner"), Kind::Product, "product");
+    if (auto it = s.find("rep"); it != s.end()) {
+      desc.rep = Lookup(*it, where.Key("rep"), Kind::Rep, "rep instance");
+    }
+    desc.light = OptBool(s, "light", where, false);
+    if (auto it = s.find("kind"); it != s.end()) desc.kind = Integer(*it, where.Key("kind"));
+    if (auto it = s.find("rootSet"); it != s.end()) {
+      std::string scope = String(*it, where.Key("rootSet"));
+      if (scope == "direct") desc.rootScope = QelRootSetScope::Direct;
+      else if (scope == "arm") desc.rootScope = QelRootSetScope::ARM;
+      else throw Refused(where.Key("rootSet"), "expected \"direct\" or \"arm\", found \"" + scope + "\"");
+    }
+    desc.shown = OptBool(s, "shown", where, true);
+    QelBaseUnknown_var set = builder_.AddSet(owner, desc);
+    if (!set) throw Refused(where.Key("rep"), "the rep instance does not belong to the owner");
+    Declare(s, where, set.get(), Kind::Set);
+    Each(s, "annotations", where, [&](const Json& a, const Where& at) { Annotation(set.get(), a, at); });
+    Each(s, "views", where, [&](const Json& v, const Where& at) { View(set.get(), v, at); });
+    Each(s, "captures", where, [&](const Json& c, const Where& at) { Capture(set.get(), c, at); });
+    if (auto it = s.find("otherElements"); it != s.end()) {
+      Where at = where.Key("otherElements");
+      std::vector<QelBaseUnknown*> others;
+      const Json& list = Array(*it, at);
+      for (size_t i = 0; i < list.size(); ++i) {
+        others.push_back(AnyOf(list[i], at.At(static_cast<int>(i)), set.get()));
+      }
+      builder_.SetOtherElements(set.get(), others);
+    }
+  }
+
+  // An element of the views component's second list: a view or capture of the set.
+  QelBaseUnknown* AnyOf(const Json& ref, const Where& where, QelBaseUnknown* set) {
+    std::string id = String(ref, where);
+    auto it = ids_.find(id);
+    if (it == ids_.end()) throw Refused(where, "unknown view or capture '" + id + "'");
+    if (it->second.kind != Kind::View && it->second.kind != Kind::Capture) {
+      throw Refused(where, "'" + id + "' is not a view or capture");
+    }
+    if (!SameSet(it->second.object.get(), set)) throw Refused(where, "'" + id + "' belongs to another set");
+    return it->second.object.get();
+  }
+
+  bool SameSet(QelBaseUnknown* member, QelBaseUnknown* set) {
+    return setOf_.count(member) && setOf_[member] == set;
+  }
+
+  template <class Fn>
+  void Each(const Json& s, const char* key, const Where& where, Fn fn) {
+    auto it = s.find(key);
+    if (it == s.end()) return;
+    Where listAt = where.Key(key);
+    const Json& list = Array(*it, listAt);
+    for (size_t i = 0; i < list.size(); ++i) {
+      Where at = listAt.At(static_cast<int>(i));
+      fn(Object(list[i], at), at);
+    }
+  }
+
+  void Annotation(QelBaseUnknown* set, const Json& a, const Where& where) {
+    CheckKeys(a, where, {"id", "alias", "names", "icon", "type", "subType", "code", "geometry", "visu", "tolerance",
+                         "default", "shown", "anchor", "segments"});
+    QelModelAnnotationDesc desc;
+    desc.alias = OptString(a, "alias", where, "");
+    desc.icon = OptString(a, "icon", where, "I_Annotation");
+    desc.typeName = String(Require(a, "type", where), where.Key("type"));
+    desc.subTypeName = String(Require(a, "subType", where), where.Key("subType"));
+    Where codeAt = where.Key("code");
+    desc.typeCode = Integer(Require(a, "code", where), codeAt);
+    if (desc.typeCode < QelTPSTypeClassifier::kFirstTypeCode || desc.typeCode > QelTPSTypeClassifier::kLastTypeCode) {
+      throw Refused(codeAt, "unknown type code " + std::to_string(desc.typeCode) + " (known codes are 1 to 13)");
+    }
+    desc.geometry = OptBool(a, "geometry", where, false);
+    if (auto it = a.find("names"); it != a.end()) {
+      Where at = where.Key("names");
+      const Json& names = Array(*it, at);
+      for (size_t i = 0; i < names.size(); ++i) desc.navigationNames.push_back(String(names[i], at.At(static_cast<int>(i))));
+    }
+    if (auto it = a.find("visu"); it != a.end()) {
+      std::string visu = String(*it, where.Key("visu"));
+      if (visu == "text") desc.visu = QelAnnotationVisu::Text;
+      else if (visu == "dimension") desc.visu = QelAnnotationVisu::Dimension;
+      else throw Refused(where.Key("visu"), "expected \"text\" or \"dimension\", found \"" + visu + "\"");
+    }
+    if (auto it = a.find("tolerance"); it != a.end() && !it->is_null()) {
+      desc.tolerance = Number(*it, where.Key("tolerance"));
+    }
+    desc.isDefault = OptBool(a, "default", where, false);
+    desc.shown = OptBool(a, "shown", where, true);
+    if (auto it = a.find("anchor"); it != a.end()) desc.anchor = Vector(*it, where.Key("anchor"));
+    if (auto it = a.find("segments"); it != a.end()) {
+      Where at = where.Key("segments");
+      const Json& segments = Array(*it, at);
+      for (size_t i = 0; i < segments.size(); ++i) {
+        Where segAt = at.At(static_cast<int>(i));
+        if (!segments[i].is_array() || segments[i].size() != 2) throw Refused(segAt, "expected [from, to]");
+        desc.segments.push_back({Vector(segments[i][0], segAt.At(0)), Vector(segments[i][1], segAt.At(1))});
+      }
+    }
+    QelBaseUnknown_var made = builder_.AddAnnotation(set, desc);
+    setOf_[made.get()] = set;
+    Declare(a, where, made.get(), Kind::Annotation);
+  }
+
+  std::vector<QelBaseUnknown*> Refs(const Json& v, const char* key, const Where& where, Kind kind, const char* what,
+                                    QelBaseUnknown* set) {
+    std::vector<QelBaseUnknown*> out;
+    auto it = v.find(key);
+    if (it == v.end()) return out;
+    Where at = where.Key(key);
+    const Json& list = Array(*it, at);
+    for (size_t i = 0; i < list.size(); ++i) {
+      Where refAt = at.At(static_cast<int>(i));
+      QelBaseUnknown* found = Lookup(list[i], refAt, kind, what);
+      if (set && !SameSet(found, set)) throw Refused(refAt, "'" + list[i].get<std::string>() + "' belongs to another set");
+      out.push_back(found);
+    }
+    return out;
+  }
+
+  void View(QelBaseUnknown* set, const Json& v, const Where& where) {
+    CheckKeys(v, where, {"id", "alias", "icon", "plane", "elements", "extraction", "references", "related", "shown"});
+    QelModelViewDesc desc;
+    desc.alias = OptString(v, "alias", where, "");
+    desc.icon = OptString(v, "icon", where, "I_AnnotationView");
+    if (auto it = v.find("plane"); it != v.end()) {
+      Where at = where.Key("plane");
+      if (it->is_null()) {
+        desc.plane.reset();
+      } else {
+        const Json& p = Object(*it, at);
+        CheckKeys(p, at, {"origin", "normal", "first", "second"});
+        desc.plane = QelMathPlane(Vector(Require(p, "origin", at), at.Key("origin")),
+                                  Vector(Require(p, "normal", at), at.Key("normal")),
+                                  Vector(Require(p, "first", at), at.Key("first")),
+                                  Vector(Require(p, "second", at), at.Key("second")));
+      }
+    }
+    desc.elements = Refs(v, "elements", where, Kind::Annotation, "annotation", set);
+    desc.extraction = OptBool(v, "extraction", where, false);
+    desc.referenceViews = Refs(v, "references", where, Kind::View, "view", nullptr);
+    desc.relatedViews = Refs(v, "related", where, Kind::View, "view", nullptr);
+    desc.shown = OptBool(v, "shown", where, true);
+    QelBaseUnknown_var made = builder_.AddView(set, desc);
+    setOf_[made.get()] = set;
+    Declare(v, where, made.get(), Kind::View);
+  }
+
+  void Capture(QelBaseUnknown* set, const Json& c, const Where& where) {
+    CheckKeys(c, where, {"id", "alias", "icon", "view", "camera", "shown"});
+    QelModelCaptureDesc desc;
+    desc.alias = OptString(c, "alias", where, "");
+    desc.icon = OptString(c, "icon", where, "I_Capture");
+    if (auto it = c.find("view"); it != c.end() && !it->is_null()) {
+      desc.view = Lookup(*it, where.Key("view"), Kind::View, "view");
+      if (!SameSet(desc.view, set)) throw Refused(where.Key("view"), "the view belongs to another set");
+    }
+    if (auto it = c.find("camera"); it != c.end() && !it->is_null()) {
+      Where at = where.Key("camera");
+      const Json& cam = Object(*it, at);
+      CheckKeys(cam, at, {"origin", "target", "zenith"});
+      desc.camera = QelModelCameraDesc{Vector(Require(cam, "origin", at), at.Key("origin")),
+                                       Vector(Require(cam, "target", at), at.Key("target")),
+                                       Vector(Require(cam, "zenith", at), at.Key("zenith"))};
+    }
+    desc.shown = OptBool(c, "shown", where, true);
+    QelBaseUnknown_var made = builder_.AddCapture(set, desc);
+    setOf_[made.get()] = set;
+    Declare(c, where, made.get(), Kind::Capture);
+  }
+
+  QelModelBuilder& builder_;
+  std::unordered_map<std::string, Entry> ids_;
+  std::unordered_map<QelBaseUnknown*, QelBaseUnknown*> setOf_;
+};
+
+// 1-based line and column of a byte offset, for syntax errors.
+std::string LineAndColumn(const std::string& text, size_t offset) {
+  size_t line = 1, column = 1;
+  for (size_t i = 0; i < offset && i < text.size(); ++i) {
+    if (text[i] == '\n') {
+      ++line;
+      column = 1;
+    } else {
+      ++column;
+    }
+  }
+  return std::to_string(line) + ":" + std::to_string(column);
+}
+}  // namespace
+
+HRESULT QelModelLoader::LoadText(const std::string& text, const std::string& sourceName, QelBaseUnknown_var& root,
+                                 std::string& error) {
+  root = nullptr;
+  error.clear();
+  try {
+    Json doc;
+    try {
+      doc = Json::parse(text);
+    } catch (const Json::parse_error& e) {
+      // The parser's own text starts with its exception name; keep only the explanation.
+      std::string what = e.what();
+      if (size_t cut = what.find("parse error"); cut != std::string::npos) what = what.substr(cut);
+      error = sourceName + ":" + LineAndColumn(text, e.byte > 0 ? e.byte - 1 : 0) + ": syntax error: " + what;
+      return E_FAIL;
+    }
+    QelModelBuilder builder(Loader::RootDesc(doc));
+    builder.SetSourceName(sourceName);
+    Loader(builder).Load(doc);
+    root = builder.Finish();
+    return S_OK;
+  } catch (const Refused& e) {
+    error = sourceName + ": " + e.what();
+  } catch (const std::exception& e) {
+    error = sourceName + ": " + e.what();
+  }
+  return E_FAIL;
+}
+
+HRESULT QelModelLoader::LoadFile(const std::string& path, QelBaseUnknown_var& root, std::string& error) {
+  root = nullptr;
+  std::ifstream in(path, std::ios::binary);
+  if (!in) {
+    error = path + ": cannot open the file";
+    return E_FAIL;
+  }
+  std::ostringstream text;
+  text << in.rdbuf();
+  return LoadText(text.str(), path, root, error);
+}
