@@ -1,5 +1,44 @@
-// Load-time entry of the module. Registration of the module's classes is added here, in
-// the order the host expects, as the classes come.
+// Load-time entry of the module. Registration of the module's classes runs here, once,
+// from the one initialiser below, in the order the host expects; entries for classes
+// still to come take their place in that order as they arrive.
+#include "QelDictionary.h"
+#include "QelILumLightLoadModeObserver.h"
+#include "QelIRovFacetPropertyObserver.h"
 #include "QelModuleVersion.h"
+#include "QelRovFacet.h"
+#include "QelRovFacetGroup.h"
+#include "QelRovFacetProperty.h"
+#include "QelRovFacetPropertyGroup.h"
+#include "QelRovFacetPropertyItem.h"
+#include "QelRovFacetsFactories.h"
 
 extern "C" const char* QelRovFacetsModuleName() { return "QelRovFacets"; }
+
+namespace {
+constexpr const char* kFramework = "QelTPSBrowserUIBase";
+
+void QelRovFacetsRegister() {
+  QelDictionary& dictionary = QelDictionary::Get();
+  QelRovFacet::MetaObject();
+  QelRovFacetProperty::MetaObject();
+  QelRovFacetPropertyItem::MetaObject();
+
+  // The facet group.
+  dictionary.Register(QelRovFacetGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
+                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetGroup, kFramework);
+  dictionary.Register(QelRovFacetGroup::MetaObject().Name(), QelILumLightLoadModeObserver::IID,
+                      &CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup, kFramework);
+
+  // The property group.
+  dictionary.Register(QelRovFacetPropertyGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
+                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup, kFramework);
+}
+
+// Registers at load and takes every entry back at unload, so that no dictionary entry
+// outlives the factories it points into.
+struct QelRovFacetsLoader {
+  QelRovFacetsLoader() { QelRovFacetsRegister(); }
+  ~QelRovFacetsLoader() { QelDictionary::Get().RemoveFramework(kFramework); }
+};
+const QelRovFacetsLoader g_loader;
+}  // namespace

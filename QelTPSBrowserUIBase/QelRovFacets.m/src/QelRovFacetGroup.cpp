@@ -1,0 +1,162 @@
+#include "QelRovFacetGroup.h"
+
+#include "QelAssert.h"
+#include "QelFrmEditor.h"
+#include "QelILumLightLoadModeObservable.h"
+#include "QelILumLightLoadModeObserver.h"
+#include "QelILumSet.h"
+#include "QelILumSetComponent.h"
+#include "QelIRovFacetPropertyObserver.h"
+#include "QelITPSLightSet.h"
+#include "QelAnnotationComponents.h"
+#include "QelRovFacet.h"
+#include "QelRovFacetFilterData.h"
+#include "QelRovFacetServices.h"
+
+namespace {
+constexpr const char* kCSOChanged = "QelCSOChangeNotification";
+constexpr int kSetComponent = 62;
+}  // namespace
+
+const QelMetaObject& QelRovFacetGroup::MetaObject() {
+  static const QelMetaObject& meta = QelMetaObject::Declare(
+      "QelRovFacetGroup", QelMetaKind::Implementation, &QelBaseUnknown::MetaObject(), "QelTPSBrowserUIBase");
+  return meta;
+}
+
+const QelMetaObject* QelRovFacetGroup::GetMetaObject() const { return &MetaObject(); }
+
+QelRovFacetGroup::QelRovFacetGroup(QelFrmEditor* editor) : editor_(editor) {
+  if (!editor_) QelAssertPointer("QelFrmEditor");
+}
+
+QelRovFacetGroup::~QelRovFacetGroup() {
+  // The panel and its dialog come with the panel behaviour; until then they stay null.
+  panel_ = nullptr;
+  dialog_ = nullptr;
+  filterData_ = nullptr;
+  annotationSetFacet_ = nullptr;
+  viewFacet_ = nullptr;
+  annotationTypeFacet_ = nullptr;
+  QelBaseUnknown* selection = editor_ ? editor_->GetCSO() : nullptr;
+  if (!selection) {
+    QelAssertPointer(editor_ ? "CSO" : "QelFrmEditor");
+  } else {
+    // This group's weak flag is already down, so the callbacks can no longer be matched
+    // by subscriber; the stored subscription names the one the group made.
+    if (csoSubscription_ != 0) QelCallbackManager::Get().RemoveCallback(csoSubscription_);
+    QelCallbackManager::Get().RemoveCallbacksOn(selection, this, kCSOChanged);
+    csoSubscription_ = 0;
+  }
+  editor_ = nullptr;
+  // No RemoveObserver here: observables hold their observers weakly and skip dead ones.
+  observables_.RemoveAll();
+}
+
+void QelRovFacetGroup::SetFacets(QelRovFacet* annotationSet, QelRovFacet* view, QelRovFacet* annotationType,
+                                 QelRovFacetFilterData* filterData) {
+  annotationSetFacet_ = QelVar<QelRovFacet>::Retain(annotationSet);
+  viewFacet_ = QelVar<QelRovFacet>::Retain(view);
+  annotationTypeFacet_ = QelVar<QelRovFacet>::Retain(annotationType);
+  filterData_ = QelVar<QelRovFacetFilterData>::Retain(filterData);
+}
+
+HRESULT QelRovFacetGroup::GetRootAndFilterData(const QelBaseUnknown_WR& group, QelBaseUnknown_var& root,
+                                               QelRovFacetFilterData*& filterData) {
+  root = nullptr;
+  QelBaseUnknown_var object = group.Get();
+  if (!object) {
+    QelAssertNullHandler();
+    return E_UNEXPECTED;
+  }
+  QelRovFacetGroup* facetGroup = QelSysDynamicCast<QelRovFacetGroup>(object.get());
+  if (!facetGroup) {
+    QelAssertPointer("QelRovFacetGroup");
+    return E_UNEXPECTED;
+  }
+  filterData = facetGroup->GetFilterData();
+  return QelRovFacetServices::GetRootPLMObject(facetGroup->editor_, root);
+}
+
+void QelRovFacetGroup::AddLightLoadModeObservers() {
+  if (observables_.Size() != 0) return;
+  QelBaseUnknown_var root;
+  QelRovFacetServices::GetRootPLMObject(editor_, root);
+  if (!root) return;
+  QelBaseUnknown_var made;
+  QelLumInstantiateComponentBase(kSetComponent, made);
+  QelVar<QelILumSetComponent> component = made.get();
+  if (!component) {
+    QelAssertPointer("QelILumSetComponent");
+    return;
+  }
+  QelListValQelBaseUnknown_var sets;
+  QelRovFacetServices::ListAllSets(root.get(), sets, false);
+  QelVar<QelILumLightLoadModeObserver> self = static_cast<QelBaseUnknown*>(this);
+  for (int i = 1; i <= sets.Size(); ++i) {
+    QelVar<QelILumSet> set = sets[i].get();
+    if (!set) continue;
+    QelVar<QelITPSLightSet> lightSet = set.get();
+    if (!lightSet) continue;
+    QelBaseUnknown_var owner;
+    component->GetSetOwner(sets[i].get(), owner);
+    QelVar<QelILumLightLoadModeObservable> observable = owner.get();
+    // A null handle takes its place too, so the list mirrors the light sets.
+    observables_.Append(static_cast<QelBaseUnknown*>(observable.get()));
+    owner = nullptr;
+    if (!observable) {
+      QelAssertNullHandler();
+      continue;
+    }
+    observable->AddObserver(self.get());
+  }
+}
+
+void QelRovFacetGroup::RemoveLightLoadModeObservers() {
+  QelVar<QelILumLightLoadModeObserver> self = static_cast<QelBaseUnknown*>(this);
+  for (int i = 1; i <= observables_.Size(); ++i) {
+    QelVar<QelILumLightLoadModeObservable> observable = observables_[i].get();
+    if (!observable) {
+      QelAssertNullHandler();
+      continue;
+    }
+    observable->RemoveObserver(self.get());
+  }
+  observables_.RemoveAll();
+}
+
+HRESULT QelRovFacetGroup::CanChangeCheckState(QelBaseUnknown*, QelCheckState) { return S_OK; }
+
+HRESULT QelRovFacetGroup::OnPropertyChanged(QelBaseUnknown* facet) {
+  if (!facet || !annotationSetFacet_ || !viewFacet_ || !filterData_) {
+    QelAssertPointer("facet");
+    return E_UNEXPECTED;
+  }
+  // A refresh may reach back into the group; keep it whole until the end.
+  QelBaseUnknown_var self = QelBaseUnknown_var::Retain(this);
+  if (annotationSetFacet_->IsEqual(facet)) {
+    viewFacet_->Refresh();
+    if (annotationTypeFacet_) annotationTypeFacet_->Refresh();
+  } else if (viewFacet_->IsEqual(facet)) {
+    filterData_->DefaultAnnot = false;
+    filterData_->TolAnnot = false;
+    if (annotationTypeFacet_) annotationTypeFacet_->Refresh();
+  } else if (annotationTypeFacet_ && annotationTypeFacet_->IsEqual(facet)) {
+    viewFacet_->Refresh();
+  } else {
+    QelAssertBool("facet of the group");
+    return E_UNEXPECTED;
+  }
+  return S_OK;
+}
+
+HRESULT QelRovFacetGroup::OnLightLoadModeChanged() {
+  RemoveLightLoadModeObservers();
+  AddLightLoadModeObservers();
+  if (!annotationSetFacet_ || !viewFacet_) {
+    QelAssertPointer("facet");
+    return E_UNEXPECTED;
+  }
+  // Rebuilding the facets and the dialog's widgets comes with the panel behaviour.
+  return S_OK;
+}

@@ -1,0 +1,65 @@
+#pragma once
+// QelRovFacetGroup: everything the data filtering panel of one editor needs, starting
+// with its record: the editor (not owned), the facets and the filter data (owned), the
+// panel and its dialog, and the light-load-mode observables it subscribed to. It is the
+// observer of its facets, which hold it weakly, and of those observables.
+#include "QelBaseUnknown_WR.h"
+#include "QelCallbackManager.h"
+#include "QelListValQelBaseUnknown_var.h"
+#include "QelMetaObject.h"
+
+class QelFrmEditor;
+class QelRovFacet;
+class QelRovFacetFilterData;
+class QelRovRefinementDlg;
+class QelDbrFraPanel;
+
+class QelRovFacetGroup : public virtual QelBaseUnknown {
+ public:
+  static const QelMetaObject& MetaObject();
+  const QelMetaObject* GetMetaObject() const override;
+
+  // A null editor is reported; the group is still made.
+  explicit QelRovFacetGroup(QelFrmEditor* editor);
+
+  QelFrmEditor* GetEditor() const { return editor_; }
+  // Null until the facets are created.
+  QelRovFacetFilterData* GetFilterData() const { return filterData_.get(); }
+
+  // The root product of the group's editor and the group's filter data (may be null), as
+  // facets ask for them through their weak reference to the group.
+  static HRESULT GetRootAndFilterData(const QelBaseUnknown_WR& group, QelBaseUnknown_var& root,
+                                      QelRovFacetFilterData*& filterData);
+
+  // Subscribes to the light-load mode of the owners of the light sets under the root,
+  // once: nothing happens while subscriptions exist.
+  void AddLightLoadModeObservers();
+  void RemoveLightLoadModeObservers();
+  const QelListValQelBaseUnknown_var& GetObservables() const { return observables_; }
+
+  // Observer operations, forwarded by the group's ties.
+  HRESULT CanChangeCheckState(QelBaseUnknown* property, QelCheckState newState);
+  // A facet reports an applied change: the facets that depend on it are refreshed.
+  HRESULT OnPropertyChanged(QelBaseUnknown* facet);
+  HRESULT OnLightLoadModeChanged();
+
+ protected:
+  ~QelRovFacetGroup() override;
+
+  // Installs the facets and the filter data, each with one reference of the group's own.
+  // The annotation type facet may be null.
+  void SetFacets(QelRovFacet* annotationSet, QelRovFacet* view, QelRovFacet* annotationType,
+                 QelRovFacetFilterData* filterData);
+
+ private:
+  QelFrmEditor* editor_ = nullptr;
+  QelVar<QelRovFacet> annotationSetFacet_;
+  QelVar<QelRovFacet> viewFacet_;
+  QelVar<QelRovFacet> annotationTypeFacet_;
+  QelVar<QelRovFacetFilterData> filterData_;
+  // Held by the panel, not by the group.
+  QelRovRefinementDlg* dialog_ = nullptr;
+  QelDbrFraPanel* panel_ = nullptr;
+  QelListValQelBaseUnknown_var observables_;
+  QelCallbackId csoSubscription_ = 0;
+};

@@ -1,0 +1,38 @@
+#pragma once
+// QelRovFacetPropertyItem: a leaf property that stands for one host object (a set, an
+// annotation, a view...). The object is held weakly: when the host deletes it, the item
+// stays in its group, keeps its state and refuses to apply. A plain item (no object) is
+// the select-all row of a property group.
+#include "QelRovFacetProperty.h"
+
+class QelRovFacetPropertyItem : public QelRovFacetProperty {
+ public:
+  // The "normal\" prefix of every item icon, built once at load.
+  static const QelUnicodeString IconPrefix;
+
+  static const QelMetaObject& MetaObject();
+  const QelMetaObject* GetMetaObject() const override;
+
+  QelRovFacetPropertyItem(const QelUnicodeString& name, QelBaseUnknown* owner);
+
+  HRESULT ApplyCheckState() override;
+  // Reads IsDisplayEnabled of the object; without an object the state stays as it is.
+  HRESULT RefreshCheckState() override;
+  int32_t CountItems() override;
+  HRESULT GetChildren(QelListValQelBaseUnknown_var& children) override;
+  HRESULT UpdateName() override;
+
+  // A counted handle on the object, null when there is none or it is gone.
+  QelBaseUnknown_var GetObject() const { return object_.Get(); }
+
+ protected:
+  ~QelRovFacetPropertyItem() override;
+
+  void SetObject(QelBaseUnknown* object) { object_ = QelBaseUnknown_WR(object); }
+  // Takes the icon from `source` through QelIIcon, prefixed; false (icon left empty)
+  // when the source does not answer it.
+  bool SetIconFrom(QelBaseUnknown* source);
+
+ private:
+  QelBaseUnknown_WR object_;
+};

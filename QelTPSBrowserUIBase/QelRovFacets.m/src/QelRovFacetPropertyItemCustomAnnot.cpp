@@ -1,0 +1,66 @@
+#include "QelRovFacetPropertyItemCustomAnnot.h"
+
+#include <memory>
+
+#include "QelAssert.h"
+#include "QelIAlias.h"
+#include "QelINavigateObject.h"
+#include "QelRovFacetFilterData.h"
+#include "QelRovFacetServices.h"
+
+const QelMetaObject& QelRovFacetPropertyItemCustomAnnot::MetaObject() {
+  static const QelMetaObject& meta =
+      QelMetaObject::Declare("QelRovFacetPropertyItemCustomAnnot", QelMetaKind::Implementation,
+                             &QelRovFacetPropertyItem::MetaObject(), "QelTPSBrowserUIBase");
+  return meta;
+}
+
+const QelMetaObject* QelRovFacetPropertyItemCustomAnnot::GetMetaObject() const { return &MetaObject(); }
+
+QelRovFacetPropertyItemCustomAnnot::QelRovFacetPropertyItemCustomAnnot(QelBaseUnknown* annotation,
+                                                                       QelRovFacetFilterData* filterData,
+                                                                       QelBaseUnknown* group)
+    : QelRovFacetPropertyItem(QelUnicodeString(), group),
+      filterData_(QelVar<QelRovFacetFilterData>::Retain(filterData)) {
+  SetObject(annotation);
+  SetCheckState(QelRovFacetServices::IsDisplayEnabled(annotation));
+  if (!filterData_) {
+    QelAssertPointer();
+    return;
+  }
+  QelUnicodeString label;
+  if (QelVar<QelINavigateObject> navigate = annotation) {
+    std::unique_ptr<QelListValQelUnicodeString> names(navigate->GetIdentificators());
+    if (names && names->Size() > 0) label = (*names)[1];
+  }
+  if (label.IsEmpty()) {
+    QelVar<QelIAlias> alias = annotation;
+    if (!alias) {
+      QelAssertNullHandler();
+      return;
+    }
+    alias->GetAlias(label);
+  }
+  SetName(label);
+  if (!SetIconFrom(annotation)) QelAssertNullHandler();
+}
+
+QelRovFacetPropertyItemCustomAnnot::~QelRovFacetPropertyItemCustomAnnot() = default;
+
+HRESULT QelRovFacetPropertyItemCustomAnnot::ApplyCheckState() {
+  QelBaseUnknown_var annotation = GetObject();
+  if (!annotation) {
+    QelAssertNullHandler();
+    return E_UNEXPECTED;
+  }
+  if (!filterData_) {
+    QelAssertPointer();
+    return E_UNEXPECTED;
+  }
+  const QelCheckState state = GetCheckState();
+  if (state != Checked && state != Unchecked) {
+    QelAssertBool("check state");
+    return E_UNEXPECTED;
+  }
+  return QelRovFacetServices::EnableDisableDisplay(annotation.get(), state == Checked ? 1 : 0, filterData_.get());
+}

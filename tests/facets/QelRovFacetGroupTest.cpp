@@ -1,0 +1,133 @@
+// The facet group record: root and filter data lookup through a weak reference, the
+// light-load-mode subscription, and the refresh of the facets that depend on a change.
+#include <gtest/gtest.h>
+
+#include "FacetTestDoubles.h"
+#include "QelAssert.h"
+#include "QelFrmEditor.h"
+#include "QelILumLightLoadModeObserver.h"
+#include "QelModelBuilder.h"
+#include "QelRovFacetFilterData.h"
+
+namespace {
+
+QelVar<QelFrmEditor> EditorOn(QelBaseUnknown* root) { return Make<QelFrmEditor>(root); }
+
+QelBaseUnknown_var AddPart(QelModelBuilder& builder) {
+  QelModelProductDesc desc;
+  desc.alias = "Part1";
+  return builder.AddProduct(builder.Root().get(), desc);
+}
+
+void AddSet(QelModelBuilder& builder, QelBaseUnknown* owner, const char* alias, bool light) {
+  QelModelSetDesc desc;
+  desc.alias = alias;
+  desc.light = light;
+  builder.AddSet(owner, desc);
+}
+
+TEST(QelRovFacetGroupRecord, RootAndFilterDataComeFromTheLiveGroupOnly) {
+  QelAssertionCapture capture;
+  QelModelBuilder builder;
+  QelBaseUnknown_var root = builder.Finish();
+  auto editor = EditorOn(root.get());
+  auto group = Make<TestFacetGroup>(editor.get());
+  auto filter = Make<QelRovFacetFilterData>();
+  group->SetFacets(nullptr, nullptr, nullptr, filter.get());
+
+  QelBaseUnknown_var found;
+  QelRovFacetFilterData* data = nullptr;
+  EXPECT_EQ(QelRovFacetGroup::GetRootAndFilterData(QelBaseUnknown_WR(group.get()), found, data), S_OK);
+  EXPECT_TRUE(found && found->IsEqual(root.get()));
+  EXPECT_EQ(data, filter.get());
+
+  auto notGroup = Make<RecordingObserver>();
+  EXPECT_EQ(QelRovFacetGroup::GetRootAndFilterData(QelBaseUnknown_WR(notGroup.get()), found, data), E_UNEXPECTED);
+  EXPECT_FALSE(found);
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer), 1);
+
+  QelBaseUnknown_WR gone(group.get());
+  group = nullptr;
+  found = root;
+  EXPECT_EQ(QelRovFacetGroup::GetRootAndFilterData(gone, found, data), E_UNEXPECTED);
+  EXPECT_FALSE(found);
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer, kQelAssertNullHandler), 1);
+}
+
+TEST(QelRovFacetGroupRecord, SubscribesOnceToLightSetOwnersAndHearsTheirSwitch) {
+  QelModelBuilder builder;
+  QelBaseUnknown_var part = AddPart(builder);
+  AddSet(builder, part.get(), "Light", true);
+  AddSet(builder, part.get(), "Heavy", false);
+  QelBaseUnknown_var root = builder.Finish();
+  auto editor = EditorOn(root.get());
+  auto group = Make<TestFacetGroup>(editor.get());
+
+  group->AddLightLoadModeObservers();
+  ASSERT_EQ(group->GetObservables().Size(), 1);
+  group->AddLightLoadModeObservers();
+  EXPECT_EQ(group->GetObservables().Size(), 1);
+
+  // Without facets the group reports its rebuild cannot run: proof the switch arrived.
+  QelAssertionCapture capture;
+  QelModelBuilder::SwitchLightLoadMode(part.get(), true);
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer, "facet"), 1);
+  EXPECT_EQ(group->GetObservables().Size(), 1);
+
+  group->RemoveLightLoadModeObservers();
+  EXPECT_EQ(group->GetObservables().Size(), 0);
+  QelModelBuilder::SwitchLightLoadMode(part.get(), false);
+  EXPECT_EQ(capture.Count(), 1);
+}
+
+class QelRovFacetGroupDependents : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    group->SetFacets(sets.get(), views.get(), types.get(), filter.get());
+    filter->DefaultAnnot = filter->TolAnnot = true;
+  }
+  QelVar<QelFrmEditor> editor = EditorOn(nullptr);
+  QelVar<TestFacetGroup> group = Make<TestFacetGroup>(editor.get());
+  QelVar<TestFacet> sets = Make<TestFacet>(group.get());
+  QelVar<TestFacet> views = Make<TestFacet>(group.get());
+  QelVar<TestFacet> types = Make<TestFacet>(group.get());
+  QelVar<QelRovFacetFilterData> filter = Make<QelRovFacetFilterData>();
+};
+
+TEST_F(QelRovFacetGroupDependents, ClickInTheSetFacetRefreshesViewsAndTypesThroughTheTie) {
+  auto p = Make<TestProperty>("p", sets.get());
+  sets->Add(p.get());
+  EXPECT_EQ(p->SetCheck(true), S_OK);
+  EXPECT_EQ(sets->refreshes, 0);
+  EXPECT_EQ(views->refreshes, 1);
+  EXPECT_EQ(types->refreshes, 1);
+  EXPECT_TRUE(filter->DefaultAnnot);
+}
+
+TEST_F(QelRovFacetGroupDependents, ViewChangeClearsTheSwitchesAndRefreshesTypes) {
+  EXPECT_EQ(group->OnPropertyChanged(views.get()), S_OK);
+  EXPECT_FALSE(filter->DefaultAnnot);
+  EXPECT_FALSE(filter->TolAnnot);
+  EXPECT_EQ(types->refreshes, 1);
+  EXPECT_EQ(group->OnPropertyChanged(types.get()), S_OK);
+  EXPECT_EQ(views->refreshes, 1);
+}
+
+TEST(QelRovFacetGroupLifetime, GroupWithFacetsAndItemsDroppedLeavesNothingAlive) {
+  auto editor = EditorOn(nullptr);
+  const int64_t before = QelBaseUnknown::LiveObjectCount();
+  {
+    auto group = Make<TestFacetGroup>(editor.get());
+    auto facet = Make<TestFacet>(group.get());
+    auto filter = Make<QelRovFacetFilterData>();
+    group->SetFacets(facet.get(), facet.get(), nullptr, filter.get());
+    auto p = Make<TestProperty>("p", facet.get());
+    facet->Add(p.get());
+    p->SetCheck(true);
+    QelVar<QelILumLightLoadModeObserver> observer = static_cast<QelBaseUnknown*>(group.get());
+    EXPECT_TRUE(observer);
+  }
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), before);
+}
+
+}  // namespace
