@@ -24,6 +24,9 @@ class QelBaseUnknown_WR {
   // The object without a reference, or null; valid only while someone else holds it.
   QelBaseUnknown* GetRaw() const;
   bool IsAlive() const { return GetRaw() != nullptr; }
+  // Whether this refers to `object`'s implementation, even while that object is being
+  // destroyed: lets a destructor find what was registered under its name.
+  bool RefersTo(QelBaseUnknown* object) const { return object && flag_ && object_ == object->GetImpl(); }
   explicit operator bool() const { return IsAlive(); }
   void Reset();
 

@@ -65,6 +65,21 @@ TEST_F(CallbackManagerTest, SubscriberThatDiedIsSkippedAndNotKeptAlive) {
   EXPECT_EQ(manager_.CountCallbacks(publisher_.get(), "N"), 0);
 }
 
+TEST_F(CallbackManagerTest, SubscriberRemovesItsCallbacksFromItsOwnDestructor) {
+  // Weak references are already dead when a destructor runs; removal must still match.
+  class Leaving : public TestAnimal {
+   public:
+    Leaving(QelBaseUnknown* publisher, int* removed) : TestAnimal("leaving"), removed_(removed) {
+      QelCallbackManager::Get().AddCallback(publisher, "N", this, [](auto*, auto*) {});
+    }
+    ~Leaving() override { *removed_ = QelCallbackManager::Get().RemoveCallbacksOn(nullptr, this); }
+    int* removed_;
+  };
+  int removed = 0;
+  (new Leaving(publisher_.get(), &removed))->Release();
+  EXPECT_EQ(removed, 1);
+}
+
 TEST_F(CallbackManagerTest, RemoveCallbacksOnSelectsBySubscriberAndName) {
   auto other = QelVar<TestAnimal>::Adopt(TestAnimal::Create("other"));
   manager_.AddCallback(publisher_.get(), "A", subscriber_.get(), [&](auto*, auto*) { calls_.push_back("sa"); });

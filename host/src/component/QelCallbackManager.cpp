@@ -29,12 +29,12 @@ bool QelCallbackManager::RemoveCallback(QelCallbackId id) {
 
 int QelCallbackManager::RemoveCallbacksOn(QelBaseUnknown* publisher, QelBaseUnknown* subscriber,
                                           std::string_view notification) {
-  QelBaseUnknown* subscriberImpl = subscriber ? subscriber->GetImpl() : nullptr;
-  QelBaseUnknown* publisherImpl = publisher ? publisher->GetImpl() : nullptr;
   int removed = 0;
   for (auto& entry : entries_) {
-    if (entry.removed || entry.subscriber.GetRaw() != subscriberImpl) continue;
-    if (publisherImpl && entry.publisher.GetRaw() != publisherImpl) continue;
+    if (entry.removed) continue;
+    // By identity, not liveness: a subscriber removes its callbacks from its destructor.
+    if (subscriber ? !entry.subscriber.RefersTo(subscriber) : entry.hasSubscriber) continue;
+    if (publisher && !entry.publisher.RefersTo(publisher)) continue;
     if (!notification.empty() && entry.notification != notification) continue;
     entry.removed = true;
     ++removed;
