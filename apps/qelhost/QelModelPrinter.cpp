@@ -1,6 +1,7 @@
 #include "QelModelPrinter.h"
 
 #include <cstdio>
+#include <functional>
 #include <string>
 
 #include "QelAnnotationComponents.h"
@@ -44,6 +45,7 @@ std::string Vector(const QelMathVector& v) { return "(" + Number(v.x) + ", " + N
 
 struct Printer {
   std::ostream& out;
+  std::function<void(QelBaseUnknown*)> onObject;  // told of every object the walk reaches
   QelVar<QelILumSetComponent> sets;
   QelVar<QelILumNamingComponent> naming;
   QelListValQelBaseUnknown_var allSets;
@@ -51,6 +53,7 @@ struct Printer {
   void Line(int depth, const std::string& text) { out << std::string(2 * depth, ' ') << text << '\n'; }
 
   void Product(QelBaseUnknown* product, int depth) {
+    if (onObject) onObject(product);
     std::string text = "product " + AliasOf(product) + " " + State(product);
     bool light = false;
     if (QelVar<QelILumLightLoadModeObservable> observable = product) observable->IsLightLoadMode(light);
@@ -66,6 +69,7 @@ struct Printer {
   }
 
   void Set(QelBaseUnknown* set, int depth) {
+    if (onObject) onObject(set);
     std::string text = "set " + AliasOf(set) + " " + State(set);
     if (QelVar<QelITPSLightSet>(set)) text += " light";
     Line(depth, text);
@@ -91,6 +95,7 @@ struct Printer {
   }
 
   void Annotation(QelBaseUnknown* annotation, int depth) {
+    if (onObject) onObject(annotation);
     QelUnicodeString type, subType;
     if (naming) {
       naming->GetTypeName(annotation, type);
@@ -124,6 +129,7 @@ struct Printer {
   }
 
   void View(QelBaseUnknown* view, int depth) {
+    if (onObject) onObject(view);
     QelVar<QelITPSView> tpsView = view;
     std::string text = "view " + AliasOf(view) + " " + State(view);
     if (QelVar<QelITPSExtractionView>(view)) text += " extraction";
@@ -141,6 +147,7 @@ struct Printer {
   }
 
   void Capture(QelBaseUnknown* capture, int depth) {
+    if (onObject) onObject(capture);
     std::string text = "capture " + AliasOf(capture) + " " + State(capture);
     QelVar<QelILumCapture> lumCapture = capture;
     bool linked = false;
@@ -162,8 +169,9 @@ struct Printer {
 };
 }  // namespace
 
-void QelModelPrinter::Print(QelBaseUnknown* root, std::ostream& out) {
-  Printer printer{out, nullptr, nullptr, {}};
+namespace {
+void Walk(QelBaseUnknown* root, std::ostream& out, std::function<void(QelBaseUnknown*)> onObject) {
+  Printer printer{out, std::move(onObject), nullptr, nullptr, {}};
   QelBaseUnknown_var component;
   QelLumInstantiateComponentBase(62, component);
   printer.sets = component.get();
@@ -171,4 +179,18 @@ void QelModelPrinter::Print(QelBaseUnknown* root, std::ostream& out) {
   printer.naming = component.get();
   QelRovFacetServices::ListAllSets(root, printer.allSets, false);
   printer.Product(root, 0);
+}
+}  // namespace
+
+void QelModelPrinter::Print(QelBaseUnknown* root, std::ostream& out) { Walk(root, out, nullptr); }
+
+QelListValQelBaseUnknown_var QelModelPrinter::FindByAlias(QelBaseUnknown* root, const std::string& alias) {
+  QelListValQelBaseUnknown_var found;
+  std::ostream discard(nullptr);  // a stream without buffer drops what the walk prints
+  Walk(root, discard, [&](QelBaseUnknown* object) {
+    QelUnicodeString name;
+    if (QelVar<QelIAlias> named = object; named && named->GetAlias(name) == S_OK && name.Utf8() == alias)
+      found.Append(object);
+  });
+  return found;
 }

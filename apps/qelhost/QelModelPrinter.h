@@ -4,6 +4,9 @@
 // views and captures, each marked [shown] or [hidden]. Reads the model only through the
 // host's interfaces and the facet services, as any client would.
 #include <ostream>
+#include <string>
+
+#include "QelListValQelBaseUnknown_var.h"
 
 #include "QelVar.h"
 
@@ -11,4 +14,7 @@ class QelModelPrinter {
  public:
   QelModelPrinter() = delete;
   static void Print(QelBaseUnknown* root, std::ostream& out);
+  // Every object of the model (product, set, annotation, view, capture) named `alias`, in
+  // the order Print shows them.
+  static QelListValQelBaseUnknown_var FindByAlias(QelBaseUnknown* root, const std::string& alias);
 };

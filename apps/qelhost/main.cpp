@@ -1,58 +1,133 @@
 // qelhost: the reference host program. It stands in for the design application: opens a
 // product model, loads the QelRovFacets plug-in and shows what a reviewer would see.
 #include <cstdio>
-#include <cstring>
 #include <iostream>
 #include <string>
+#include <vector>
 
+#include "QelDictionary.h"
+#include "QelHostOptions.h"
 #include "QelModelLoader.h"
 #include "QelModelPrinter.h"
+#include "QelModuleLoader.h"
+#include "QelRovFacetFilterData.h"
+#include "QelRovFacetServices.h"
 #include "QelSampleProduct.h"
+#include "QelSettingRepository.h"
 
 namespace {
-const char kUsage[] =
-    "usage: qelhost [options] [model.json]\n"
-    "\n"
-    "Opens a product model (the shipped sample when none is given) and shows its\n"
-    "annotation sets, annotations, views and captures.\n"
-    "\n"
-    "options:\n"
-    "  -h, --help       show this help and exit\n"
-    "  -V, --version    show the version and exit\n";
+constexpr const char* kModuleFramework = "QelTPSBrowserUIBase";
+
+// Prints or writes the requested user settings; false when one could not be done.
+bool HandleSettings(const std::vector<QelHostOptions::SettingRequest>& requests) {
+  bool ok = true;
+  for (const auto& request : requests) {
+    QelSettingRepository* repository = QelSettingRepository::GetRepository(request.repository.c_str());
+    if (!repository) {
+      std::fprintf(stderr, "qelhost: no settings repository '%s'\n", request.repository.c_str());
+      ok = false;
+      continue;
+    }
+    const char* key = request.key.c_str();
+    if (request.value) {
+      char* end = nullptr;
+      long asInt = std::strtol(request.value->c_str(), &end, 10);
+      bool isInt = !request.value->empty() && *end == '\0' && asInt >= INT32_MIN && asInt <= INT32_MAX;
+      HRESULT written = isInt ? repository->WriteSetting(key, static_cast<int>(asInt))
+                              : repository->WriteSetting(key, request.value->c_str());
+      if (written != S_OK || repository->SaveRepository() != S_OK) {
+        std::fprintf(stderr, "qelhost: could not save %s/%s in %s\n", request.repository.c_str(), key,
+                     repository->GetFilePath().c_str());
+        ok = false;
+        continue;
+      }
+    }
+    int number = 0;
+    QelString text;
+    if (repository->ReadSetting(key, number) == S_OK)
+      std::printf("setting %s/%s = %d\n", request.repository.c_str(), key, number);
+    else if (repository->ReadSetting(key, text) == S_OK)
+      std::printf("setting %s/%s = \"%s\"\n", request.repository.c_str(), key, text.CastToCharPtr());
+    else
+      std::printf("setting %s/%s is not set (%s)\n", request.repository.c_str(), key, repository->GetFilePath().c_str());
+  }
+  return ok;
+}
+
+bool ApplyDisplayChanges(QelBaseUnknown* root, const std::vector<QelHostOptions::DisplayChange>& changes) {
+  for (const auto& change : changes) {
+    QelListValQelBaseUnknown_var objects = QelModelPrinter::FindByAlias(root, change.name);
+    if (objects.Size() == 0) {
+      std::fprintf(stderr, "qelhost: --%s '%s': the model has no object of that name\n",
+                   change.show ? "show" : "hide", change.name.c_str());
+      return false;
+    }
+    QelRovFacetServices::EnableDisableDisplay(objects, change.show ? 1 : 0, nullptr);
+  }
+  return true;
+}
+
+// Re-applies the annotations of the visible sets through the filter data, as the type
+// facet does when its default-annotation switch or tolerance range changes.
+void ApplyFilter(QelBaseUnknown* root, const QelHostOptions& options) {
+  auto filter = QelVar<QelRovFacetFilterData>::Adopt(new QelRovFacetFilterData);
+  filter->DefaultAnnot = options.defaultOnly;
+  if (options.tolerance) {
+    const QelToleranceRange& range = *options.tolerance;
+    filter->TolAnnot = true;
+    filter->SetToleranceValues(range.leftOp, range.left ? &*range.left : nullptr, range.rightOp,
+                               range.right ? &*range.right : nullptr);
+  }
+  QelListValQelBaseUnknown_var annotations;
+  QelRovFacetServices::ListAnnotationsOfVisibleSets(root, annotations);
+  QelRovFacetServices::EnableDisableDisplay(annotations, 1, filter.get());
+}
+
+void* LoadPlugin(const QelHostOptions& options) {
+  std::string error;
+  void* module = QelModuleLoader::Load(options.modulePath, error);
+  if (!module) {
+    std::fprintf(stderr, "qelhost: %s\n", error.c_str());
+    return nullptr;
+  }
+  std::vector<std::string> registered = QelDictionary::Get().Describe(kModuleFramework);
+  std::printf("plug-in %s loaded: %zu registrations\n", options.modulePath.c_str(), registered.size());
+  if (options.listModule)
+    for (const auto& line : registered) std::printf("  %s\n", line.c_str());
+  return module;
+}
 }  // namespace
 
 int main(int argc, char** argv) {
-  std::string modelPath;
-  for (int i = 1; i < argc; ++i) {
-    std::string arg = argv[i];
-    if (arg == "-h" || arg == "--help") {
-      std::fputs(kUsage, stdout);
-      return 0;
-    }
-    if (arg == "-V" || arg == "--version") {
-      std::printf("qelhost %s\n", QEL_VERSION);
-      return 0;
-    }
-    if (!arg.empty() && arg[0] == '-') {
-      std::fprintf(stderr, "qelhost: unknown option '%s'\n%s", arg.c_str(), kUsage);
-      return 2;
-    }
-    if (!modelPath.empty()) {
-      std::fprintf(stderr, "qelhost: only one model file may be given\n%s", kUsage);
-      return 2;
-    }
-    modelPath = arg;
+  QelHostOptions options;
+  std::string error;
+  if (!QelHostOptions::Parse(std::vector<std::string>(argv + 1, argv + argc), options, error)) {
+    std::fprintf(stderr, "qelhost: %s\n\n%s", error.c_str(), QelHostOptions::Usage());
+    return 2;
+  }
+  if (options.action == QelHostOptions::Action::Help) {
+    std::fputs(QelHostOptions::Usage(), stdout);
+    return 0;
+  }
+  if (options.action == QelHostOptions::Action::Version) {
+    std::printf("qelhost %s\n", QEL_VERSION);
+    return 0;
   }
 
   QelBaseUnknown_var root;
-  std::string error;
-  HRESULT loaded = modelPath.empty()
+  HRESULT loaded = options.modelPath.empty()
                        ? QelModelLoader::LoadText(kQelSampleProductText, kQelSampleProductName, root, error)
-                       : QelModelLoader::LoadFile(modelPath, root, error);
+                       : QelModelLoader::LoadFile(options.modelPath, root, error);
   if (loaded != S_OK) {
     std::fprintf(stderr, "qelhost: %s\n", error.c_str());
     return 1;
   }
+  std::printf("model %s\n", options.modelPath.empty() ? kQelSampleProductName : options.modelPath.c_str());
+  if (!LoadPlugin(options)) return 1;
+  if (!HandleSettings(options.settings)) return 1;
+  if (!ApplyDisplayChanges(root.get(), options.displayChanges)) return 1;
+  if (options.defaultOnly || options.tolerance) ApplyFilter(root.get(), options);
+  std::cout << '\n';
   QelModelPrinter::Print(root.get(), std::cout);
   return 0;
 }
