@@ -1,5 +1,7 @@
 #include "QelRovFacetPropertyItem.h"
 
+#include "QelAssert.h"
+#include "QelIAlias.h"
 #include "QelIIcon.h"
 #include "QelRovFacetServices.h"
 
@@ -40,5 +42,40 @@ bool QelRovFacetPropertyItem::SetIconFrom(QelBaseUnknown* source) {
   QelUnicodeString name;
   icon->GetIconName(name);
   SetIconName(IconPrefix + name);
+  return true;
+}
+
+bool QelRovFacetPropertyItem::EnableOfCheckState(int& enable) const {
+  const QelCheckState state = GetCheckState();
+  if (state != Checked && state != Unchecked) {
+    QelAssertBool("check state");
+    return false;
+  }
+  enable = state == Checked ? 1 : 0;
+  return true;
+}
+
+HRESULT QelRovFacetPropertyItem::ApplyToObject(QelRovFacetFilterData* filterData, bool filterRequired) {
+  QelBaseUnknown_var object = GetObject();
+  if (!object) {
+    QelAssertNullHandler();
+    return E_UNEXPECTED;
+  }
+  if (filterRequired && !filterData) {
+    QelAssertPointer();
+    return E_UNEXPECTED;
+  }
+  int enable = 0;
+  if (!EnableOfCheckState(enable)) return E_UNEXPECTED;
+  return QelRovFacetServices::EnableDisableDisplay(object.get(), enable, filterData);
+}
+
+bool QelRovFacetPropertyItem::AppendAlias(QelUnicodeString& label, QelBaseUnknown* source, const char* separator) {
+  QelVar<QelIAlias> alias = source;
+  if (!alias) return false;
+  QelUnicodeString text;
+  alias->GetAlias(text);
+  if (!label.IsEmpty()) label += QelUnicodeString(separator);
+  label += text;
   return true;
 }

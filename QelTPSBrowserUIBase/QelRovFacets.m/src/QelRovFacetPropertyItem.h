@@ -5,6 +5,8 @@
 // the select-all row of a property group.
 #include "QelRovFacetProperty.h"
 
+class QelRovFacetFilterData;
+
 class QelRovFacetPropertyItem : public QelRovFacetProperty {
  public:
   // The "normal\" prefix of every item icon, built once at load.
@@ -32,6 +34,16 @@ class QelRovFacetPropertyItem : public QelRovFacetProperty {
   // Takes the icon from `source` through QelIIcon, prefixed; false (icon left empty)
   // when the source does not answer it.
   bool SetIconFrom(QelBaseUnknown* source);
+  // The enable value of the current state: 1 for Checked, 0 for Unchecked; any other
+  // state (a group's partial state is never pushed down to items) is reported, false.
+  bool EnableOfCheckState(int& enable) const;
+  // The display request of an item standing for one object, with `filterData` passed on.
+  // A gone object, a missing filter data when `filterRequired`, or a state that cannot be
+  // applied is reported and answers E_UNEXPECTED.
+  HRESULT ApplyToObject(QelRovFacetFilterData* filterData, bool filterRequired);
+  // Appends the alias of `source` to `label`, after `separator` when the label already has
+  // text; false when the source has no alias.
+  static bool AppendAlias(QelUnicodeString& label, QelBaseUnknown* source, const char* separator);
 
  private:
   QelBaseUnknown_WR object_;

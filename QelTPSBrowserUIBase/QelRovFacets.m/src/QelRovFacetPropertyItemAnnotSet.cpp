@@ -4,20 +4,6 @@
 #include "QelIAlias.h"
 #include "QelRovFacetServices.h"
 
-namespace {
-// Appends `source`'s alias after `separator` (only when the label already has text);
-// false when the source has no alias.
-bool AppendAlias(QelUnicodeString& label, QelBaseUnknown* source, const char* separator) {
-  QelVar<QelIAlias> alias = source;
-  if (!alias) return false;
-  QelUnicodeString text;
-  alias->GetAlias(text);
-  if (!label.IsEmpty()) label += QelUnicodeString(separator);
-  label += text;
-  return true;
-}
-}  // namespace
-
 const QelMetaObject& QelRovFacetPropertyItemAnnotSet::MetaObject() {
   static const QelMetaObject& meta =
       QelMetaObject::Declare("QelRovFacetPropertyItemAnnotSet", QelMetaKind::Implementation,
@@ -52,16 +38,4 @@ HRESULT QelRovFacetPropertyItemAnnotSet::UpdateName() {
   return S_OK;
 }
 
-HRESULT QelRovFacetPropertyItemAnnotSet::ApplyCheckState() {
-  QelBaseUnknown_var set = GetObject();
-  if (!set) {
-    QelAssertNullHandler();
-    return E_UNEXPECTED;
-  }
-  const QelCheckState state = GetCheckState();
-  if (state != Checked && state != Unchecked) {
-    QelAssertBool("check state");
-    return E_UNEXPECTED;
-  }
-  return QelRovFacetServices::EnableDisableDisplay(set.get(), state == Checked ? 1 : 0, nullptr);
-}
+HRESULT QelRovFacetPropertyItemAnnotSet::ApplyCheckState() { return ApplyToObject(nullptr, false); }

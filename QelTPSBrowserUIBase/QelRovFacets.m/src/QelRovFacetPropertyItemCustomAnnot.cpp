@@ -47,20 +47,4 @@ QelRovFacetPropertyItemCustomAnnot::QelRovFacetPropertyItemCustomAnnot(QelBaseUn
 
 QelRovFacetPropertyItemCustomAnnot::~QelRovFacetPropertyItemCustomAnnot() = default;
 
-HRESULT QelRovFacetPropertyItemCustomAnnot::ApplyCheckState() {
-  QelBaseUnknown_var annotation = GetObject();
-  if (!annotation) {
-    QelAssertNullHandler();
-    return E_UNEXPECTED;
-  }
-  if (!filterData_) {
-    QelAssertPointer();
-    return E_UNEXPECTED;
-  }
-  const QelCheckState state = GetCheckState();
-  if (state != Checked && state != Unchecked) {
-    QelAssertBool("check state");
-    return E_UNEXPECTED;
-  }
-  return QelRovFacetServices::EnableDisableDisplay(annotation.get(), state == Checked ? 1 : 0, filterData_.get());
-}
+HRESULT QelRovFacetPropertyItemCustomAnnot::ApplyCheckState() { return ApplyToObject(filterData_.get(), true); }

@@ -26,12 +26,8 @@ QelRovFacetPropertyItemTypeAnnot::~QelRovFacetPropertyItemTypeAnnot() = default;
 int32_t QelRovFacetPropertyItemTypeAnnot::CountItems() { return annotations_.Size(); }
 
 HRESULT QelRovFacetPropertyItemTypeAnnot::ApplyCheckState() {
-  const QelCheckState state = GetCheckState();
-  if (state != Checked && state != Unchecked) {
-    QelAssertBool("check state");
-    return E_UNEXPECTED;
-  }
-  const int enable = state == Checked ? 1 : 0;
+  int enable = 0;
+  if (!EnableOfCheckState(enable)) return E_UNEXPECTED;
   for (int i = annotations_.Size(); i >= 1; --i) {
     QelBaseUnknown* annotation = annotations_[i].get();
     if (!annotation) {

@@ -4,17 +4,6 @@
 #include "QelIAlias.h"
 #include "QelRovFacetServices.h"
 
-namespace {
-void AppendAliasAfterSlash(QelUnicodeString& label, QelBaseUnknown* source) {
-  QelVar<QelIAlias> alias = source;
-  if (!alias) return;
-  QelUnicodeString text;
-  alias->GetAlias(text);
-  if (!label.IsEmpty()) label += QelUnicodeString("/");
-  label += text;
-}
-}  // namespace
-
 const QelMetaObject& QelRovFacetPropertyItemViewCapture::MetaObject() {
   static const QelMetaObject& meta =
       QelMetaObject::Declare("QelRovFacetPropertyItemViewCapture", QelMetaKind::Implementation,
@@ -44,22 +33,10 @@ HRESULT QelRovFacetPropertyItemViewCapture::UpdateName() {
     return E_UNEXPECTED;
   }
   alias->GetAlias(label);
-  AppendAliasAfterSlash(label, ownerObject_.Get().get());
-  AppendAliasAfterSlash(label, set_.Get().get());
+  AppendAlias(label, ownerObject_.Get().get(), "/");
+  AppendAlias(label, set_.Get().get(), "/");
   SetName(label);
   return S_OK;
 }
 
-HRESULT QelRovFacetPropertyItemViewCapture::ApplyCheckState() {
-  QelBaseUnknown_var object = GetObject();
-  if (!object) {
-    QelAssertNullHandler();
-    return E_UNEXPECTED;
-  }
-  const QelCheckState state = GetCheckState();
-  if (state != Checked && state != Unchecked) {
-    QelAssertBool("check state");
-    return E_UNEXPECTED;
-  }
-  return QelRovFacetServices::EnableDisableDisplay(object.get(), state == Checked ? 1 : 0, nullptr);
-}
+HRESULT QelRovFacetPropertyItemViewCapture::ApplyCheckState() { return ApplyToObject(nullptr, false); }
