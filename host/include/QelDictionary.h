@@ -43,7 +43,7 @@ class QelDictionary {
     QelExtensionCreator creator;
     std::string framework;
   };
-  // One line per entry ("<key> <interface> <framework>", "<late type> extension <class>",
+  // One line per entry ("<key> <interface name or identifier> <framework>", "<late type> extension <class>",
   // "component <name>"), for a person to see what a module registered.
   std::vector<std::string> Describe(std::string_view framework = {}) const;
 

@@ -2,6 +2,16 @@
 // from the one initialiser below, in the order the host expects; entries for classes
 // still to come take their place in that order as they arrive.
 #include "QelDictionary.h"
+#include "QelILumCapture.h"
+#include "QelILumGeometry.h"
+#include "QelILumLightLoadModeObservable.h"
+#include "QelILumSet.h"
+#include "QelITPS.h"
+#include "QelITPSExtractionView.h"
+#include "QelITPSLight.h"
+#include "QelITPSLightSet.h"
+#include "QelITPSView.h"
+#include "QelInterfaceDescription.h"
 #include "QelILumLightLoadModeObserver.h"
 #include "QelIRovFacetPropertyObserver.h"
 #include "QelModuleVersion.h"
@@ -16,6 +26,11 @@ extern "C" const char* QelRovFacetsModuleName() { return "QelRovFacets"; }
 
 namespace {
 constexpr const char* kFramework = "QelTPSBrowserUIBase";
+
+template <class I>
+void DescribeInterface(const char* name) {
+  QelInterfaceDescription::Declare(name, I::IID, kFramework);
+}
 
 void QelRovFacetsRegister() {
   QelDictionary& dictionary = QelDictionary::Get();
@@ -32,6 +47,19 @@ void QelRovFacetsRegister() {
   // The property group.
   dictionary.Register(QelRovFacetPropertyGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
                       &CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup, kFramework);
+
+  // The interfaces: the module's own, then the host's that it queries or implements.
+  DescribeInterface<QelIRovFacetPropertyObserver>("QelIRovFacetPropertyObserver");
+  DescribeInterface<QelITPSView>("QelITPSView");
+  DescribeInterface<QelITPS>("QelITPS");
+  DescribeInterface<QelILumSet>("QelILumSet");
+  DescribeInterface<QelILumCapture>("QelILumCapture");
+  DescribeInterface<QelITPSExtractionView>("QelITPSExtractionView");
+  DescribeInterface<QelILumGeometry>("QelILumGeometry");
+  DescribeInterface<QelILumLightLoadModeObservable>("QelILumLightLoadModeObservable");
+  DescribeInterface<QelITPSLightSet>("QelITPSLightSet");
+  DescribeInterface<QelILumLightLoadModeObserver>("QelILumLightLoadModeObserver");
+  DescribeInterface<QelITPSLight>("QelITPSLight");
 }
 
 // Registers at load and takes every entry back at unload, so that no dictionary entry

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "QelInterfaceDescription.h"
 #include "QelMetaObject.h"
 
 QelDictionary& QelDictionary::Get() {
@@ -72,7 +73,7 @@ std::vector<std::string> QelDictionary::Describe(std::string_view framework) con
   std::vector<std::string> lines;
   auto wanted = [&](const std::string& owner) { return framework.empty() || owner == framework; };
   for (const auto& entry : factories_)
-    if (wanted(entry.framework)) lines.push_back(entry.key + " " + entry.iid.ToString() + " " + entry.framework);
+    if (wanted(entry.framework)) lines.push_back(entry.key + " " + QelInterfaceDescription::NameOf(entry.iid) + " " + entry.framework);
   for (const auto& entry : extensions_)
     if (wanted(entry.framework))
       lines.push_back(entry.lateType + " extension " + entry.extension->Name() + " " + entry.framework);
