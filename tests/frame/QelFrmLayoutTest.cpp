@@ -99,66 +99,6 @@ TEST_F(LayoutTest, ClosingAnEditorDropsOnlyItsWindowsAnnouncesItThenActivatesAno
 
 // The controller and facet groups unsubscribe from inside notifications; these prove the
 // frame's notifications survive that.
-TEST_F(LayoutTest, ACallbackRemovedByAnotherDuringTheSameDispatchIsNotCalled) {
-  auto editor = NewEditor();
-  QelFrmWindow* a = AddWindow<Qel3DWindow>(editor.get());
-  QelFrmWindow* b = AddWindow<Qel3DWindow>(editor.get());
-  std::vector<std::string> calls;
-  QelCallbackId first = 0, third = 0;
-  auto s1 = NewObject(), s2 = NewObject(), s3 = NewObject();
-  first = frame_->AddCallback(layout_, kQelWindowActivated, s1.get(), [&](QelBaseUnknown*, QelBaseUnknown*) {
-    calls.push_back("first");
-    EXPECT_TRUE(frame_->RemoveCallback(first)) << "removing the running callback";
-    EXPECT_TRUE(frame_->RemoveCallback(third));
-  });
-  frame_->AddCallback(layout_, kQelWindowActivated, s2.get(), [&](QelBaseUnknown*, QelBaseUnknown*) {
-    calls.push_back("second");
-  });
-  third = frame_->AddCallback(layout_, kQelWindowActivated, s3.get(), [&](QelBaseUnknown*, QelBaseUnknown*) {
-    calls.push_back("third");
-  });
-
-  layout_->SetCurrentWindow(a);
-  EXPECT_EQ(calls, (std::vector<std::string>{"first", "second"}));
-  calls.clear();
-  layout_->SetCurrentWindow(b);
-  EXPECT_EQ(calls, (std::vector<std::string>{"second"}));
-  frame_->RemoveCallbacksOn(nullptr, s2.get());
-}
-
-TEST_F(LayoutTest, ACallbackAddedDuringADispatchWaitsForTheNextOne) {
-  auto editor = NewEditor();
-  QelFrmWindow* a = AddWindow<Qel3DWindow>(editor.get());
-  QelFrmWindow* b = AddWindow<Qel3DWindow>(editor.get());
-  bool added = false;
-  int lateCalls = 0;
-  auto subscriber = NewObject();
-  frame_->AddCallback(layout_, kQelWindowActivated, subscriber.get(), [&](QelBaseUnknown*, QelBaseUnknown*) {
-    if (std::exchange(added, true)) return;
-    frame_->AddCallback(layout_, kQelWindowActivated, subscriber.get(),
-                        [&](QelBaseUnknown*, QelBaseUnknown*) { ++lateCalls; });
-  });
-  layout_->SetCurrentWindow(a);
-  EXPECT_EQ(lateCalls, 0);
-  layout_->SetCurrentWindow(b);
-  EXPECT_EQ(lateCalls, 1);
-  frame_->RemoveCallbacksOn(layout_, subscriber.get());
-}
-
-TEST_F(LayoutTest, ASubscriberThatDiedIsSkippedAndDoesNotKeepItsCallback) {
-  auto editor = NewEditor();
-  QelFrmWindow* a = AddWindow<Qel3DWindow>(editor.get());
-  int calls = 0;
-  auto subscriber = NewObject();
-  frame_->AddCallback(layout_, kQelWindowActivated, subscriber.get(),
-                      [&](QelBaseUnknown*, QelBaseUnknown*) { ++calls; });
-  EXPECT_EQ(QelCallbackManager::Get().CountCallbacks(layout_, kQelWindowActivated), 1);
-  subscriber = nullptr;
-  layout_->SetCurrentWindow(a);
-  EXPECT_EQ(calls, 0);
-  EXPECT_EQ(QelCallbackManager::Get().CountCallbacks(layout_, kQelWindowActivated), 0);
-}
-
 TEST_F(LayoutTest, RemovingTheCurrentWindowHandsOverToTheLastRemainingOne) {
   auto editor = NewEditor();
   QelFrmWindow* a = AddWindow<Qel3DWindow>(editor.get());
