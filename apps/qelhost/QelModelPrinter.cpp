@@ -58,6 +58,15 @@ struct Printer {
     bool light = false;
     if (QelVar<QelILumLightLoadModeObservable> observable = product) observable->IsLightLoadMode(light);
     if (light) text += " light-load mode";
+    QelMathTransformation placement;
+    if (QelVar<QelIPLMNavOccurrence> occurrence = product;
+        occurrence && occurrence->GetPlacement(placement) == S_OK && !placement.IsIdentity()) {
+      text += ", placed at " + Vector(placement.GetTranslation());
+      const QelMathTransformation translationOnly = QelMathTransformation::Translation(placement.GetTranslation());
+      if (!(placement == translationOnly))
+        text += " with axes " + Vector(placement.GetXAxis()) + " " + Vector(placement.GetYAxis()) + " " +
+                Vector(placement.GetZAxis());
+    }
     Line(depth, text);
     for (const auto& set : allSets) {
       QelBaseUnknown_var owner;

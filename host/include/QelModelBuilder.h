@@ -18,6 +18,7 @@
 #include <vector>
 
 #include "QelMathPlane.h"
+#include "QelMathTransformation.h"
 #include "QelVar.h"
 
 // Whether a set is one of the root product's own sets, and as what.
@@ -30,6 +31,8 @@ struct QelModelProductDesc {
   std::string icon = "I_Product";
   bool shown = true;
   bool lightLoadMode = false;
+  // From the product's coordinates to its father's; the root has no father and keeps the identity.
+  QelMathTransformation placement{};
 };
 
 struct QelModelRepInstanceDesc {

@@ -29,6 +29,7 @@ class QelPLMProductOccurrence : public QelModelObject,
   HRESULT ListRepOccurrences(QelListValQelBaseUnknown_var& reps) override;
   HRESULT ListChildren(QelListValQelBaseUnknown_var& children) override;
   HRESULT GetFather(QelBaseUnknown_var& father) override;
+  HRESULT GetPlacement(QelMathTransformation& placement) override;
 
   HRESULT AddObserver(QelBaseUnknown* observer) override;
   HRESULT RemoveObserver(QelBaseUnknown* observer) override;
@@ -37,6 +38,7 @@ class QelPLMProductOccurrence : public QelModelObject,
 
   void AddChild(QelPLMProductOccurrence* child);
   void AddRepInstance(QelPLMRepInstance* rep);
+  void SetPlacement(const QelMathTransformation& placement) { placement_ = placement; }
   QelPLMProductOccurrence* Father() const;
   const std::vector<QelVar<QelPLMProductOccurrence>>& Children() const { return children_; }
   const std::vector<QelVar<QelPLMRepInstance>>& RepInstances() const { return reps_; }
@@ -58,4 +60,5 @@ class QelPLMProductOccurrence : public QelModelObject,
   QelBaseUnknown_var ownedData_;
   QelBaseUnknown_WR data_;
   bool lightLoadMode_ = false;
+  QelMathTransformation placement_;
 };

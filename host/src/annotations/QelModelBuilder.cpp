@@ -48,6 +48,7 @@ QelBaseUnknown_var QelModelBuilder::AddProduct(const QelBaseUnknown_var& parent,
   auto child = QelVar<QelPLMProductOccurrence>::Adopt(new QelPLMProductOccurrence(desc.alias, desc.icon, desc.shown));
   child->SetModelData(state_->model.get(), false);
   child->SetLightLoadMode(desc.lightLoadMode);
+  child->SetPlacement(desc.placement);
   father->AddChild(child.get());
   return QelBaseUnknown_var(child.get());
 }

@@ -1,5 +1,8 @@
 #include "QelModelLoader.h"
 
+#include <cmath>
+#include <cstdio>
+#include <filesystem>
 #include <fstream>
 #include <initializer_list>
 #include <sstream>
@@ -96,6 +99,28 @@ bool OptBool(const Json& o, const char* key, const Where& where, bool fallback) 
   return it == o.end() ? fallback : Bool(*it, where.Key(key));
 }
 
+// A product's placement in its father: the images of the axes and of the origin.
+QelMathTransformation Placement(const Json& j, const Where& where) {
+  const Json& p = Object(j, where);
+  CheckKeys(p, where, {"origin", "x", "y", "z"});
+  auto read = [&](const char* key, const QelMathVector& fallback) {
+    auto it = p.find(key);
+    if (it == p.end()) return fallback;
+    Where at = where.Key(key);
+    QelMathVector v = Vector(*it, at);
+    // Out-of-range literals parse as infinities; they would poison every point placed below.
+    if (!std::isfinite(v.x) || !std::isfinite(v.y) || !std::isfinite(v.z)) throw Refused(at, "expected finite numbers");
+    return v;
+  };
+  QelMathTransformation t(read("x", {1, 0, 0}), read("y", {0, 1, 0}), read("z", {0, 0, 1}), read("origin", {}));
+  // Relative to the axes' lengths, so that a small but sound scale is not taken for a flat one.
+  const double scale = t.GetXAxis().Norm() * t.GetYAxis().Norm() * t.GetZAxis().Norm();
+  if (std::abs(t.Determinant()) <= 1e-12 * scale) {
+    throw Refused(where, "degenerate placement: the x, y and z axes do not span space (determinant 0)");
+  }
+  return t;
+}
+
 class Loader {
  public:
   explicit Loader(QelModelBuilder& builder) : builder_(builder) {}
@@ -126,6 +151,9 @@ class Loader {
     }
     Where rootAt = top.Key("root");
     const Json& root = Object(Require(doc, "root", top), rootAt);
+    if (root.contains("placement")) {
+      throw Refused(rootAt.Key("placement"), "the root product has no father to be placed in");
+    }
     Product(root, rootAt, builder_.Root().get());
     auto it = doc.find("sets");
     if (it == doc.end()) return;
@@ -159,7 +187,7 @@ class Loader {
   }
 
   void Product(const Json& p, const Where& where, QelBaseUnknown* made) {
-    CheckKeys(p, where, {"id", "alias", "icon", "shown", "lightLoadMode", "reps", "children"});
+    CheckKeys(p, where, {"id", "alias", "icon", "shown", "lightLoadMode", "placement", "reps", "children"});
     Declare(p, where, made, Kind::Product);
     if (auto it = p.find("reps"); it != p.end()) {
       Where repsAt = where.Key("reps");
@@ -184,6 +212,9 @@ class Loader {
                                  .icon = OptString(c, "icon", at, "I_Product"),
                                  .shown = OptBool(c, "shown", at, true),
                                  .lightLoadMode = OptBool(c, "lightLoadMode", at, false)};
+        if (auto placement = c.find("placement"); placement != c.end()) {
+          desc.placement = Placement(*placement, at.Key("placement"));
+        }
         QelBaseUnknown_var child = builder_.AddProduct(made, desc);
         Product(c, at, child.get());
       }

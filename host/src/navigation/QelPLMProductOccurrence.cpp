@@ -38,6 +38,11 @@ HRESULT QelPLMProductOccurrence::GetFather(QelBaseUnknown_var& father) {
   return father ? S_OK : S_FALSE;
 }
 
+HRESULT QelPLMProductOccurrence::GetPlacement(QelMathTransformation& placement) {
+  placement = placement_;
+  return S_OK;
+}
+
 QelPLMProductOccurrence* QelPLMProductOccurrence::Father() const {
   return QelSysDynamicCast<QelPLMProductOccurrence>(father_.GetRaw());
 }
