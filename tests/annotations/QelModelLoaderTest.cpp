@@ -141,11 +141,21 @@ TEST(QelModelLoaderTest, RefusesEachClassOfBadContentNamingTheJsonPath) {
   for (const Case& c : cases) EXPECT_EQ(Refusal(c.text), c.expected);
 }
 
-TEST(QelModelLoaderTest, RefusesAMissingFileNamingIt) {
+TEST(QelModelLoaderTest, RefusesWhatIsNotAReadableModelFileNamingIt) {
   QelBaseUnknown_var root;
   std::string error;
   EXPECT_EQ(QelModelLoader::LoadFile("/nonexistent/model.json", root, error), E_FAIL);
   EXPECT_EQ(error, "/nonexistent/model.json: cannot open the file");
+  const std::string folder = ::testing::TempDir();
+  EXPECT_EQ(QelModelLoader::LoadFile(folder, root, error), E_FAIL);
+  EXPECT_EQ(error, folder + ": is a folder, not a model file");
+  EXPECT_FALSE(root);
+}
+
+TEST(QelModelLoaderTest, BinaryGarbageIsQuotedAsPrintableText) {
+  std::string error = Refusal(std::string("\x01\xFF\xFE{", 4));
+  EXPECT_EQ(error.rfind("bad.json:1:1: syntax error", 0), 0u) << error;
+  for (unsigned char c : error) EXPECT_TRUE(c >= 0x20 && c < 0x7F) << "raw byte " << int(c) << " in: " << error;
 }
 
 TEST(QelModelLoaderTest, ModelFromTextKeepsSetStructure) {

@@ -401,6 +401,22 @@ class Loader {
   std::unordered_map<QelBaseUnknown*, QelBaseUnknown*> setOf_;
 };
 
+// The parser quotes what it last read, which for a binary file is raw bytes: escape what
+// a terminal would not show as text.
+std::string Printable(const std::string& text) {
+  std::string out;
+  for (unsigned char c : text) {
+    if (c >= 0x20 && c < 0x7F) {
+      out += static_cast<char>(c);
+    } else {
+      char escaped[5];
+      std::snprintf(escaped, sizeof escaped, "\\x%02X", c);
+      out += escaped;
+    }
+  }
+  return out;
+}
+
 // 1-based line and column of a byte offset, for syntax errors.
 std::string LineAndColumn(const std::string& text, size_t offset) {
   size_t line = 1, column = 1;
@@ -428,7 +444,7 @@ HRESULT QelModelLoader::LoadText(const std::string& text, const std::string& sou
       // The parser's own text starts with its exception name; keep only the explanation.
       std::string what = e.what();
       if (size_t cut = what.find("parse error"); cut != std::string::npos) what = what.substr(cut);
-      error = sourceName + ":" + LineAndColumn(text, e.byte > 0 ? e.byte - 1 : 0) + ": syntax error: " + what;
+      error = sourceName + ":" + LineAndColumn(text, e.byte > 0 ? e.byte - 1 : 0) + ": syntax error: " + Printable(what);
       return E_FAIL;
     }
     QelModelBuilder builder(Loader::RootDesc(doc));
@@ -446,6 +462,11 @@ HRESULT QelModelLoader::LoadText(const std::string& text, const std::string& sou
 
 HRESULT QelModelLoader::LoadFile(const std::string& path, QelBaseUnknown_var& root, std::string& error) {
   root = nullptr;
+  std::error_code ec;
+  if (std::filesystem::is_directory(path, ec)) {
+    error = path + ": is a folder, not a model file";
+    return E_FAIL;
+  }
   std::ifstream in(path, std::ios::binary);
   if (!in) {
     error = path + ": cannot open the file";
@@ -453,5 +474,9 @@ HRESULT QelModelLoader::LoadFile(const std::string& path, QelBaseUnknown_var& ro
   }
   std::ostringstream text;
   text << in.rdbuf();
+  if (in.bad()) {
+    error = path + ": cannot read the file";
+    return E_FAIL;
+  }
   return LoadText(text.str(), path, root, error);
 }
