@@ -118,4 +118,18 @@ TEST_F(DataExtensionTest, ExtensionHeldBeyondItsObjectSeesTheObjectGone) {
   EXPECT_EQ(greeter->Greet(), "orphan");
 }
 
+TEST_F(DataExtensionTest, ObjectInDestructionGetsNoNewExtension) {
+  // A class that queries itself from its destructor, after its extensions are gone.
+  class Queried : public TestDog {
+   public:
+    ~Queried() override {
+      QelVar<ITestCounter> late = static_cast<QelBaseUnknown*>(this);
+      found = static_cast<bool>(late);
+    }
+    bool found = true;
+  };
+  (new Queried)->Release();
+  EXPECT_EQ(g_extensionsCreated, 0);
+}
+
 }  // namespace

@@ -86,6 +86,9 @@ void* QelBaseUnknown::QueryDirect(const QelIID& iid) {
 }
 
 QelBaseUnknown* QelBaseUnknown::FindOrCreateExtension(const QelMetaObject& extension) {
+  // An object in destruction has already released its extensions; one made now would
+  // never be released.
+  if (refs_ >= kDestroying) return nullptr;
   if (!extensions_) extensions_ = new Extensions;
   for (auto& [meta, object] : extensions_->items)
     if (meta == &extension) return object;
