@@ -1,6 +1,8 @@
 // qelhost: the reference host program. It stands in for the design application: opens a
 // product model, loads the QelRovFacets plug-in and shows what a reviewer would see.
+#include <cstdint>
 #include <cstdio>
+#include <cstdlib>
 #include <iostream>
 #include <string>
 #include <vector>

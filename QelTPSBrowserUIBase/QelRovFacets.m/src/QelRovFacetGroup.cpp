@@ -42,9 +42,6 @@ QelRovFacetGroup::~QelRovFacetGroup() {
   if (!selection) {
     QelAssertPointer(editor_ ? "CSO" : "QelFrmEditor");
   } else {
-    // This group's weak flag is already down, so the callbacks can no longer be matched
-    // by subscriber; the stored subscription names the one the group made.
-    if (csoSubscription_ != 0) QelCallbackManager::Get().RemoveCallback(csoSubscription_);
     QelCallbackManager::Get().RemoveCallbacksOn(selection, this, kCSOChanged);
     csoSubscription_ = 0;
   }

@@ -20,10 +20,6 @@ bool& RefinementSwitch() {
   static bool active = QelGetEnv("QEL_REFINEMENT_DEV") != "0";
   return active;
 }
-
-QelModelObject* ModelObjectOf(QelBaseUnknown* object) { return QelModelObject::From(object); }
-
-QelRootSetScope ScopeOf(const QelLumAnnotationSet& set) { return set.RootScope(); }
 }  // namespace
 
 bool QelRovFacetServices::IsRefinementDevActive() { return RefinementSwitch(); }
@@ -68,7 +64,7 @@ HRESULT QelRovFacetServices::ListDirectSets(QelBaseUnknown* object, QelListValQe
       take = rep && rep->Reference() == reference;
     } else if (product) {
       const bool ownedHere = set->Owner() && set->Owner()->IsEqual(product);
-      take = (ownedHere && !rep) || (ownedHere && rep && flag) || (isRoot && ScopeOf(*set) == QelRootSetScope::Direct);
+      take = (ownedHere && !rep) || (ownedHere && rep && flag) || (isRoot && set->RootScope() == QelRootSetScope::Direct);
     }
     if (take) list.Append(static_cast<QelILumSet*>(set.get()));
   }
@@ -80,7 +76,7 @@ HRESULT QelRovFacetServices::ListARMOrDirectSets(QelBaseUnknown* root, QelListVa
   QelAnnotationModel* model = QelAnnotationModel::Of(root);
   if (!model) return E_FAIL;
   for (const auto& set : model->Sets()) {
-    if (ScopeOf(*set) != QelRootSetScope::None) list.Append(static_cast<QelILumSet*>(set.get()));
+    if (set->RootScope() != QelRootSetScope::None) list.Append(static_cast<QelILumSet*>(set.get()));
   }
   return S_OK;
 }
@@ -118,7 +114,7 @@ HRESULT QelRovFacetServices::EnableDisableDisplay(const QelListValQelBaseUnknown
 }
 
 HRESULT QelRovFacetServices::EnableDisableDisplay(QelBaseUnknown* object, int enable, QelRovFacetFilterData* filter) {
-  auto* target = ModelObjectOf(object);
+  auto* target = QelModelObject::From(object);
   if (!target) return E_FAIL;
   if (enable != 0 && enable != 1) return E_FAIL;
   // The filter rule itself (docs/display-rule.md) lives with the annotation.
@@ -127,7 +123,7 @@ HRESULT QelRovFacetServices::EnableDisableDisplay(QelBaseUnknown* object, int en
 }
 
 HRESULT QelRovFacetServices::IsDisplayEnabled(QelBaseUnknown* object) {
-  auto* target = ModelObjectOf(object);
+  auto* target = QelModelObject::From(object);
   if (!target) return E_FAIL;
   return target->IsShown() ? S_OK : S_FALSE;
 }
