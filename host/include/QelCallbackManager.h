@@ -35,7 +35,10 @@ class QelCallbackManager {
   // Calls, in order of subscription, every live callback of the publisher for the name.
   void Dispatch(QelBaseUnknown* publisher, std::string_view notification, QelBaseUnknown* payload = nullptr);
 
-  int CountCallbacks(QelBaseUnknown* publisher, std::string_view notification = {}) const;
+  // The callbacks still to be called: those whose subscriber is gone do not count. With a
+  // subscriber, only that subscriber's.
+  int CountCallbacks(QelBaseUnknown* publisher, std::string_view notification = {},
+                     QelBaseUnknown* subscriber = nullptr) const;
 
  private:
   QelCallbackManager() = default;

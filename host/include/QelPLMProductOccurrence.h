@@ -4,9 +4,10 @@
 // root occurrence also owns the annotation data of the model (an opaque object), so the
 // last handle on the root frees the whole model.
 //
-// It is the owner of annotation sets and, for light sets, the light-load mode observable:
-// observers are held weakly, may be added or removed during a notification, and one that
-// goes away without RemoveObserver is skipped, never called and never kept alive.
+// It is the owner of annotation sets and, for light sets, the light-load mode observable.
+// Observers are subscribed through QelCallbackManager: held weakly, they may be added or
+// removed during a notification, and one that goes away without RemoveObserver is
+// skipped, never called and never kept alive.
 #include <vector>
 
 #include "QelBaseUnknown_WR.h"
@@ -42,7 +43,6 @@ class QelPLMProductOccurrence : public QelModelObject,
   QelPLMProductOccurrence* Father() const;
   const std::vector<QelVar<QelPLMProductOccurrence>>& Children() const { return children_; }
   const std::vector<QelVar<QelPLMRepInstance>>& RepInstances() const { return reps_; }
-  int CountObservers() const;
 
   // The annotation data of the model: owned by the root, seen weakly by the others.
   void SetModelData(QelBaseUnknown* data, bool owning);
@@ -56,7 +56,6 @@ class QelPLMProductOccurrence : public QelModelObject,
   QelBaseUnknown_WR father_;
   std::vector<QelVar<QelPLMProductOccurrence>> children_;
   std::vector<QelVar<QelPLMRepInstance>> reps_;
-  std::vector<QelBaseUnknown_WR> observers_;
   QelBaseUnknown_var ownedData_;
   QelBaseUnknown_WR data_;
   bool lightLoadMode_ = false;

@@ -68,11 +68,14 @@ void QelCallbackManager::Dispatch(QelBaseUnknown* publisher, std::string_view no
   Compact();
 }
 
-int QelCallbackManager::CountCallbacks(QelBaseUnknown* publisher, std::string_view notification) const {
+int QelCallbackManager::CountCallbacks(QelBaseUnknown* publisher, std::string_view notification,
+                                       QelBaseUnknown* subscriber) const {
   QelBaseUnknown* publisherImpl = publisher ? publisher->GetImpl() : nullptr;
   return static_cast<int>(std::count_if(entries_.begin(), entries_.end(), [&](const Entry& entry) {
     return !entry.removed && entry.publisher.GetRaw() == publisherImpl &&
-           (notification.empty() || entry.notification == notification);
+           (notification.empty() || entry.notification == notification) &&
+           (!entry.hasSubscriber || entry.subscriber.IsAlive()) &&
+           (!subscriber || entry.subscriber.RefersTo(subscriber));
   }));
 }
 

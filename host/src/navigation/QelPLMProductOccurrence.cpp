@@ -1,10 +1,13 @@
 #include "QelPLMProductOccurrence.h"
 
-#include <algorithm>
-
+#include "QelCallbackManager.h"
 #include "QelILumLightLoadModeObserver.h"
 #include "QelMetaObject.h"
 #include "QelPLMRepInstance.h"
+
+namespace {
+constexpr const char* kLightLoadModeChanged = "LightLoadModeChanged";
+}  // namespace
 
 const QelMetaObject& QelPLMProductOccurrence::MetaObject() {
   static const QelMetaObject& meta = QelMetaObject::Declare(
@@ -65,26 +68,19 @@ QelBaseUnknown_var QelPLMProductOccurrence::ModelData() const { return data_.Get
 
 HRESULT QelPLMProductOccurrence::AddObserver(QelBaseUnknown* observer) {
   if (!observer) return E_FAIL;
-  for (const auto& known : observers_) {
-    if (QelBaseUnknown* alive = known.GetRaw(); alive && alive->IsEqual(observer)) return S_FALSE;
-  }
-  observers_.emplace_back(observer);
+  QelCallbackManager& callbacks = QelCallbackManager::Get();
+  if (callbacks.CountCallbacks(this, kLightLoadModeChanged, observer) > 0) return S_FALSE;
+  // The callback list holds the observer weakly: one that goes away is skipped, never kept.
+  QelBaseUnknown_WR weak(observer);
+  callbacks.AddCallback(this, kLightLoadModeChanged, observer, [weak](QelBaseUnknown*, QelBaseUnknown*) {
+    if (QelVar<QelILumLightLoadModeObserver> told = weak.Get().get()) told->OnLightLoadModeChanged();
+  });
   return S_OK;
 }
 
 HRESULT QelPLMProductOccurrence::RemoveObserver(QelBaseUnknown* observer) {
   if (!observer) return E_FAIL;
-  for (auto it = observers_.begin(); it != observers_.end(); ++it) {
-    if (QelBaseUnknown* alive = it->GetRaw(); alive && alive->IsEqual(observer)) {
-      observers_.erase(it);
-      return S_OK;
-    }
-  }
-  return S_FALSE;
-}
-
-int QelPLMProductOccurrence::CountObservers() const {
-  return static_cast<int>(std::count_if(observers_.begin(), observers_.end(), [](const auto& o) { return o.IsAlive(); }));
+  return QelCallbackManager::Get().RemoveCallbacksOn(this, observer, kLightLoadModeChanged) > 0 ? S_OK : S_FALSE;
 }
 
 HRESULT QelPLMProductOccurrence::IsLightLoadMode(bool& on) {
@@ -95,20 +91,6 @@ HRESULT QelPLMProductOccurrence::IsLightLoadMode(bool& on) {
 HRESULT QelPLMProductOccurrence::SetLightLoadMode(bool on) {
   if (on == lightLoadMode_) return S_FALSE;
   lightLoadMode_ = on;
-  // Observers may add or remove observers while being told; work on a snapshot and skip
-  // whoever was removed meanwhile, so a removed observer is never called again.
-  QelBaseUnknown_var self(static_cast<QelIPLMNavOccurrence*>(this));
-  std::vector<QelBaseUnknown_WR> snapshot = observers_;
-  for (const auto& entry : snapshot) {
-    QelBaseUnknown_var target = entry.Get();
-    if (!target) continue;
-    bool stillObserving = std::any_of(observers_.begin(), observers_.end(), [&](const QelBaseUnknown_WR& o) {
-      QelBaseUnknown* alive = o.GetRaw();
-      return alive && alive->IsEqual(target.get());
-    });
-    if (!stillObserving) continue;
-    if (QelVar<QelILumLightLoadModeObserver> observer = target.get()) observer->OnLightLoadModeChanged();
-  }
-  std::erase_if(observers_, [](const QelBaseUnknown_WR& o) { return !o.IsAlive(); });
+  QelCallbackManager::Get().Dispatch(this, kLightLoadModeChanged);
   return S_OK;
 }
