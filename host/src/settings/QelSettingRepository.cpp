@@ -99,6 +99,20 @@ bool WriteAll(int fd, const std::string& text) {
   return true;
 }
 
+// Reads exactly `count` values of a setting (a single value counts as an array of one);
+// nothing is written unless all of them convert.
+template <class T>
+HRESULT ReadValues(const json* v, T* values, int count, bool (*convert)(const json&, T&)) {
+  if (!v || !values || count <= 0) return E_FAIL;
+  const json single = json::array({*v});
+  const json& all = v->is_array() ? *v : single;
+  if (static_cast<int>(all.size()) < count) return E_FAIL;
+  std::vector<T> read(static_cast<size_t>(count));
+  for (int i = 0; i < count; ++i)
+    if (!convert(all[static_cast<size_t>(i)], read[static_cast<size_t>(i)])) return E_FAIL;
+  std::copy(read.begin(), read.end(), values);
+  return S_OK;
+}
 }  // namespace
 
 struct QelSettingRepository::State {
@@ -316,29 +330,11 @@ HRESULT QelSettingRepository::ReadSetting(const char* key, QelString& value) {
 }
 
 HRESULT QelSettingRepository::ReadSetting(const char* key, int* values, int count) {
-  const json* v = state_->Find(key);
-  if (!v || !values || count <= 0) return E_FAIL;
-  const json single = json::array({*v});
-  const json& all = v->is_array() ? *v : single;
-  if (static_cast<int>(all.size()) < count) return E_FAIL;
-  std::vector<int> read(static_cast<size_t>(count));
-  for (int i = 0; i < count; ++i)
-    if (!AsInt(all[static_cast<size_t>(i)], read[static_cast<size_t>(i)])) return E_FAIL;
-  std::copy(read.begin(), read.end(), values);
-  return S_OK;
+  return ReadValues(state_->Find(key), values, count, &AsInt);
 }
 
 HRESULT QelSettingRepository::ReadSetting(const char* key, double* values, int count) {
-  const json* v = state_->Find(key);
-  if (!v || !values || count <= 0) return E_FAIL;
-  const json single = json::array({*v});
-  const json& all = v->is_array() ? *v : single;
-  if (static_cast<int>(all.size()) < count) return E_FAIL;
-  std::vector<double> read(static_cast<size_t>(count));
-  for (int i = 0; i < count; ++i)
-    if (!AsDouble(all[static_cast<size_t>(i)], read[static_cast<size_t>(i)])) return E_FAIL;
-  std::copy(read.begin(), read.end(), values);
-  return S_OK;
+  return ReadValues(state_->Find(key), values, count, &AsDouble);
 }
 
 HRESULT QelSettingRepository::WriteSetting(const char* key, int value, int silent) {
