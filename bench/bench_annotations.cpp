@@ -26,7 +26,7 @@ void BM_EnablePass(benchmark::State& state) {
   std::string error;
   QelModelLoader::LoadText(QelModelGenerator::MakeModelText(static_cast<int>(state.range(0))), "generated.json", root,
                            error);
-  auto filter = QelVar<QelRovFacetFilterData>::Adopt(new QelRovFacetFilterData());
+  auto filter = QelMakeVar<QelRovFacetFilterData>();
   filter->TolAnnot = true;
   double high = 0.5;
   filter->SetToleranceValues(QelPropertyOperatorGreater, nullptr, QelPropertyOperatorLessOrEqual, &high);

@@ -35,23 +35,21 @@ struct AnnotationGroup {
     QelModelBuilder builder;
     QelModelSetDesc setDesc;
     setDesc.alias = "Set";
-    QelBaseUnknown_var set = builder.AddSet(builder.Root().get(), setDesc);
+    QelBaseUnknown_var set = builder.AddSet(builder.Root(), setDesc);
     std::vector<QelBaseUnknown_var> annotations;
     annotations.reserve(count);
     QelModelAnnotationDesc desc;
     desc.typeName = "Tol";
     for (int i = 0; i < count; ++i) {
       desc.alias = std::to_string(i);
-      annotations.push_back(builder.AddAnnotation(set.get(), desc));
+      annotations.push_back(builder.AddAnnotation(set, desc));
     }
     root = builder.Finish();
-    owner = QelVar<SilentObserver>::Adopt(new SilentObserver);
-    filter = QelVar<QelRovFacetFilterData>::Adopt(new QelRovFacetFilterData);
-    group = QelVar<QelRovFacetPropertyGroup>::Adopt(
-        new QelRovFacetPropertyGroup(QelUnicodeString("Tol"), QelUnicodeString(), owner.get(), false));
+    owner = QelMakeVar<SilentObserver>();
+    filter = QelMakeVar<QelRovFacetFilterData>();
+    group = QelMakeVar<QelRovFacetPropertyGroup>(QelUnicodeString("Tol"), QelUnicodeString(), owner.get(), false);
     for (auto& annotation : annotations) {
-      auto item = QelVar<QelRovFacetPropertyItemCustomAnnot>::Adopt(
-          new QelRovFacetPropertyItemCustomAnnot(annotation.get(), filter.get(), group.get()));
+      auto item = QelMakeVar<QelRovFacetPropertyItemCustomAnnot>(annotation.get(), filter.get(), group.get());
       group->AddProperty(item.get());
     }
     group->UpdateCheckStateFromChildren();
@@ -76,11 +74,10 @@ BENCHMARK(BM_ClickCheckBoxGroup)->RangeMultiplier(10)->Range(1000, 100000)->Comp
 
 // The model's own share of a click: items without an object apply nothing.
 void BM_ClickCheckBoxGroupPlainItems(benchmark::State& state) {
-  auto owner = QelVar<SilentObserver>::Adopt(new SilentObserver);
-  auto group = QelVar<QelRovFacetPropertyGroup>::Adopt(
-      new QelRovFacetPropertyGroup(QelUnicodeString("g"), QelUnicodeString(), owner.get(), false));
+  auto owner = QelMakeVar<SilentObserver>();
+  auto group = QelMakeVar<QelRovFacetPropertyGroup>(QelUnicodeString("g"), QelUnicodeString(), owner.get(), false);
   for (int64_t i = 0; i < state.range(0); ++i)
-    group->AddProperty(QelVar<QelRovFacetPropertyItem>::Adopt(new QelRovFacetPropertyItem("i", group.get())).get());
+    group->AddProperty(QelMakeVar<QelRovFacetPropertyItem>("i", group.get()).get());
   bool checked = true;
   for (auto _ : state) {
     benchmark::DoNotOptimize(group->SetCheck(checked));

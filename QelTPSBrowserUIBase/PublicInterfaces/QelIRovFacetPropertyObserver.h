@@ -16,6 +16,9 @@ class QelIRovFacetPropertyObserver : public virtual QelBaseUnknown {
   // Told after a change: `object` is the property that changed, or the facet when the
   // observer is the facet group. Callers ignore the answer.
   virtual HRESULT OnPropertyChanged(QelBaseUnknown* object) = 0;
+
+ protected:
+  ~QelIRovFacetPropertyObserver() override = default;
 };
 
 using QelIRovFacetPropertyObserver_var = QelVar<QelIRovFacetPropertyObserver>;

@@ -27,7 +27,7 @@
 namespace {
 std::string AliasOf(QelBaseUnknown* object) {
   QelUnicodeString alias;
-  if (QelVar<QelIAlias> named = object) named->GetAlias(alias);
+  if (QelVar<QelIAlias> named{object}) named->GetAlias(alias);
   return alias.IsEmpty() ? std::string("(no name)") : alias.Utf8();
 }
 
@@ -56,10 +56,10 @@ struct Printer {
     if (onObject) onObject(product);
     std::string text = "product " + AliasOf(product) + " " + State(product);
     bool light = false;
-    if (QelVar<QelILumLightLoadModeObservable> observable = product) observable->IsLightLoadMode(light);
+    if (QelVar<QelILumLightLoadModeObservable> observable{product}) observable->IsLightLoadMode(light);
     if (light) text += " light-load mode";
     QelMathTransformation placement;
-    if (QelVar<QelIPLMNavOccurrence> occurrence = product;
+    if (QelVar<QelIPLMNavOccurrence> occurrence{product};
         occurrence && occurrence->GetPlacement(placement) == S_OK && !placement.IsIdentity()) {
       text += ", placed at " + Vector(placement.GetTranslation());
       const QelMathTransformation translationOnly = QelMathTransformation::Translation(placement.GetTranslation());
@@ -73,7 +73,7 @@ struct Printer {
       if (sets && sets->GetSetOwner(set.get(), owner) == S_OK && owner->IsEqual(product)) Set(set.get(), depth + 1);
     }
     QelListValQelBaseUnknown_var children;
-    if (QelVar<QelIPLMNavOccurrence> occurrence = product) occurrence->ListChildren(children);
+    if (QelVar<QelIPLMNavOccurrence> occurrence{product}) occurrence->ListChildren(children);
     for (const auto& child : children) Product(child.get(), depth + 1);
   }
 
@@ -82,7 +82,7 @@ struct Printer {
     std::string text = "set " + AliasOf(set) + " " + State(set);
     if (QelVar<QelITPSLightSet>(set)) text += " light";
     Line(depth, text);
-    QelVar<QelILumSet> lumSet = set;
+    QelVar<QelILumSet> lumSet(set);
     if (!lumSet) return;
     QelVar<QelILumCollection> list;
     lumSet->GetElements(list);
@@ -114,19 +114,19 @@ struct Printer {
     QelBaseUnknown_var owner;
     double tolerance = 0;
     bool hasTolerance = false, isDefault = false;
-    if (QelVar<QelITPS> tps = annotation) {
+    if (QelVar<QelITPS> tps{annotation}) {
       tps->GetTypeServices(owner);
       hasTolerance = tps->GetToleranceValue(tolerance) == S_OK;
       tps->IsDefaultAnnotation(isDefault);
-    } else if (QelVar<QelILumGeometry> geometry = annotation) {
+    } else if (QelVar<QelILumGeometry> geometry{annotation}) {
       geometry->GetTypeServices(owner);
       hasTolerance = geometry->GetToleranceValue(tolerance) == S_OK;
       geometry->IsDefaultAnnotation(isDefault);
     }
-    if (QelVar<QelITPSTypeClassifier> classifier = owner.get()) {
+    if (QelVar<QelITPSTypeClassifier> classifier{owner.get()}) {
       QelBaseUnknown_var typeObject;
       classifier->GetType(annotation, typeObject);
-      if (QelVar<QelITPSType> t = typeObject.get()) t->GetTypeCode(code);
+      if (QelVar<QelITPSType> t{typeObject.get()}) t->GetTypeCode(code);
     }
     std::string text = "annotation " + AliasOf(annotation) + " " + State(annotation) + " " + type.Utf8() + " / " +
                        subType.Utf8() + ", code " + std::to_string(code);
@@ -139,7 +139,7 @@ struct Printer {
 
   void View(QelBaseUnknown* view, int depth) {
     if (onObject) onObject(view);
-    QelVar<QelITPSView> tpsView = view;
+    QelVar<QelITPSView> tpsView(view);
     std::string text = "view " + AliasOf(view) + " " + State(view);
     if (QelVar<QelITPSExtractionView>(view)) text += " extraction";
     QelMathPlane* plane = nullptr;
@@ -158,7 +158,7 @@ struct Printer {
   void Capture(QelBaseUnknown* capture, int depth) {
     if (onObject) onObject(capture);
     std::string text = "capture " + AliasOf(capture) + " " + State(capture);
-    QelVar<QelILumCapture> lumCapture = capture;
+    QelVar<QelILumCapture> lumCapture(capture);
     bool linked = false;
     QelBaseUnknown_var view;
     if (lumCapture && lumCapture->IsLinkedToView(linked) == S_OK && linked && lumCapture->GetLinkedView(view) == S_OK) {
@@ -183,9 +183,9 @@ void Walk(QelBaseUnknown* root, std::ostream& out, std::function<void(QelBaseUnk
   Printer printer{out, std::move(onObject), nullptr, nullptr, {}};
   QelBaseUnknown_var component;
   QelLumInstantiateComponentBase(62, component);
-  printer.sets = component.get();
+  printer.sets = QelVar<QelILumSetComponent>(component.get());
   QelLumInstantiateComponentBase(59, component);
-  printer.naming = component.get();
+  printer.naming = QelVar<QelILumNamingComponent>(component.get());
   QelRovFacetServices::ListAllSets(root, printer.allSets, false);
   printer.Product(root, 0);
 }
@@ -198,7 +198,7 @@ QelListValQelBaseUnknown_var QelModelPrinter::FindByAlias(QelBaseUnknown* root, 
   std::ostream discard(nullptr);  // a stream without buffer drops what the walk prints
   Walk(root, discard, [&](QelBaseUnknown* object) {
     QelUnicodeString name;
-    if (QelVar<QelIAlias> named = object; named && named->GetAlias(name) == S_OK && name.Utf8() == alias)
+    if (QelVar<QelIAlias> named{object}; named && named->GetAlias(name) == S_OK && name.Utf8() == alias)
       found.Append(object);
   });
   return found;

@@ -72,7 +72,7 @@ bool ApplyDisplayChanges(QelBaseUnknown* root, const std::vector<QelHostOptions:
 // Re-applies the annotations of the visible sets through the filter data, as the type
 // facet does when its default-annotation switch or tolerance range changes.
 void ApplyFilter(QelBaseUnknown* root, const QelHostOptions& options) {
-  auto filter = QelVar<QelRovFacetFilterData>::Adopt(new QelRovFacetFilterData);
+  auto filter = QelMakeVar<QelRovFacetFilterData>();
   filter->DefaultAnnot = options.defaultOnly;
   if (options.tolerance) {
     const QelToleranceRange& range = *options.tolerance;

@@ -18,10 +18,10 @@ struct Model {
   }
 };
 
-QelVar<QelRovFacetFilterData> NewFilter() { return QelVar<QelRovFacetFilterData>::Adopt(new QelRovFacetFilterData()); }
+QelVar<QelRovFacetFilterData> NewFilter() { return QelMakeVar<QelRovFacetFilterData>(); }
 
 bool ShownAfterEnable(QelBaseUnknown* annotation, QelRovFacetFilterData* filter) {
-  QelModelBuilder::SetShown(annotation, false);
+  QelModelBuilder::SetShown(QelBaseUnknown_var(annotation), false);
   QelRovFacetServices::EnableDisableDisplay(annotation, 1, filter);
   return QelRovFacetServices::IsDisplayEnabled(annotation) == S_OK;
 }
@@ -152,7 +152,7 @@ TEST(QelDisplayRuleTest, BothSwitchesMustHoldAndFilterLeavesSetsAlone) {
   filter->TolAnnot = true;
   EXPECT_TRUE(ShownAfterEnable(defaultInRange.get(), filter.get()));
   EXPECT_FALSE(ShownAfterEnable(defaultNoTolerance.get(), filter.get()));
-  QelModelBuilder::SetShown(m.set.get(), false);
+  QelModelBuilder::SetShown(m.set, false);
   QelRovFacetServices::EnableDisableDisplay(m.set.get(), 1, filter.get());
   EXPECT_EQ(QelRovFacetServices::IsDisplayEnabled(m.set.get()), S_OK);
 }

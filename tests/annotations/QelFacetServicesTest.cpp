@@ -39,7 +39,7 @@ std::vector<std::string> Aliases(const QelListValQelBaseUnknown_var& list) {
   std::vector<std::string> out;
   for (const auto& o : list) {
     QelUnicodeString alias;
-    if (QelVar<QelIAlias> named = o.get()) named->GetAlias(alias);
+    if (QelVar<QelIAlias> named{o.get()}) named->GetAlias(alias);
     out.push_back(alias.Utf8());
   }
   return out;
@@ -58,6 +58,7 @@ class CountingObserver : public QelILumLightLoadModeObserver {
   QelILumLightLoadModeObservable* removeFrom = nullptr;
 
  protected:
+  ~CountingObserver() override = default;
   void* QueryDirect(const QelIID& iid) override {
     if (void* mine = QelQueryDirect<QelILumLightLoadModeObserver>(this, iid)) return mine;
     return QelBaseUnknown::QueryDirect(iid);
@@ -82,7 +83,7 @@ TEST(QelFacetServicesTest, ListingFlagsSelectTheDocumentedSets) {
   QelRovFacetServices::ListDirectSets(m.part1.get(), list, true);
   EXPECT_EQ(Aliases(list), (Names{"Set.1"}));
   list.RemoveAll();
-  QelVar<QelIPLMNavRepInstance> rep = m.rep1.get();
+  QelVar<QelIPLMNavRepInstance> rep(m.rep1.get());
   QelRovFacetServices::ListDirectSets(rep->GetReferencedObject().get(), list, true);
   EXPECT_EQ(Aliases(list), (Names{"Set.1"}));
 }
@@ -117,7 +118,7 @@ TEST(QelFacetServicesTest, DisplayOfForeignObjectsIsRefused) {
 
 TEST(QelFacetServicesTest, RootComesFromTheEditor) {
   Assembly m;
-  auto editor = QelVar<QelFrmEditor>::Adopt(new QelFrmEditor(m.root.get()));
+  auto editor = QelMakeVar<QelFrmEditor>(m.root.get());
   QelBaseUnknown_var root;
   EXPECT_EQ(QelRovFacetServices::GetRootPLMObject(editor.get(), root), S_OK);
   EXPECT_TRUE(root->IsEqual(m.root.get()));
@@ -129,7 +130,7 @@ TEST(QelFacetServicesTest, SetComponentGivesOwnersKindsRepInstancesAndModes) {
   Assembly m;
   QelBaseUnknown_var made;
   ASSERT_EQ(QelLumInstantiateComponentBase(62, made), S_OK);
-  QelVar<QelILumSetComponent> sets = made.get();
+  QelVar<QelILumSetComponent> sets(made.get());
   ASSERT_TRUE(sets);
   QelBaseUnknown_var owner;
   EXPECT_EQ(sets->GetSetOwner(m.set1.get(), owner), S_OK);
@@ -161,44 +162,44 @@ TEST(QelFacetServicesTest, LightSetsAndTheirViewsAndCapturesAnswerAsLight) {
 
 TEST(QelLightLoadModeTest, ObserverIsToldUntilRemoved) {
   Assembly m;
-  QelVar<QelILumLightLoadModeObservable> owner = m.part1.get();
+  QelVar<QelILumLightLoadModeObservable> owner(m.part1.get());
   ASSERT_TRUE(owner);
-  auto observer = QelVar<CountingObserver>::Adopt(new CountingObserver());
+  auto observer = QelMakeVar<CountingObserver>();
   owner->AddObserver(observer.get());
   owner->AddObserver(observer.get());  // once only
-  EXPECT_EQ(QelModelBuilder::SwitchLightLoadMode(m.part1.get(), false), S_OK);
+  EXPECT_EQ(QelModelBuilder::SwitchLightLoadMode(m.part1, false), S_OK);
   EXPECT_EQ(observer->calls, 1);
-  EXPECT_EQ(QelModelBuilder::SwitchLightLoadMode(m.part1.get(), false), S_FALSE);  // no change, no call
+  EXPECT_EQ(QelModelBuilder::SwitchLightLoadMode(m.part1, false), S_FALSE);  // no change, no call
   EXPECT_EQ(observer->calls, 1);
   owner->RemoveObserver(observer.get());
-  QelModelBuilder::SwitchLightLoadMode(m.part1.get(), true);
+  QelModelBuilder::SwitchLightLoadMode(m.part1, true);
   EXPECT_EQ(observer->calls, 1);
 }
 
 TEST(QelLightLoadModeTest, ObserverRemovingItselfDuringNotificationIsNotCalledAgain) {
   Assembly m;
-  QelVar<QelILumLightLoadModeObservable> owner = m.part1.get();
-  auto first = QelVar<CountingObserver>::Adopt(new CountingObserver());
-  auto second = QelVar<CountingObserver>::Adopt(new CountingObserver());
+  QelVar<QelILumLightLoadModeObservable> owner(m.part1.get());
+  auto first = QelMakeVar<CountingObserver>();
+  auto second = QelMakeVar<CountingObserver>();
   first->removeFrom = owner.get();
   owner->AddObserver(first.get());
   owner->AddObserver(second.get());
-  QelModelBuilder::SwitchLightLoadMode(m.part1.get(), false);
-  QelModelBuilder::SwitchLightLoadMode(m.part1.get(), true);
+  QelModelBuilder::SwitchLightLoadMode(m.part1, false);
+  QelModelBuilder::SwitchLightLoadMode(m.part1, true);
   EXPECT_EQ(first->calls, 1);
   EXPECT_EQ(second->calls, 2);
 }
 
 TEST(QelLightLoadModeTest, ObserverGoneWithoutRemovalIsSkippedAndNotKeptAlive) {
   Assembly m;
-  QelVar<QelILumLightLoadModeObservable> owner = m.part1.get();
+  QelVar<QelILumLightLoadModeObservable> owner(m.part1.get());
   const int64_t before = QelBaseUnknown::LiveObjectCount();
   {
-    auto observer = QelVar<CountingObserver>::Adopt(new CountingObserver());
+    auto observer = QelMakeVar<CountingObserver>();
     owner->AddObserver(observer.get());
   }
   EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), before);
-  EXPECT_EQ(QelModelBuilder::SwitchLightLoadMode(m.part1.get(), false), S_OK);
+  EXPECT_EQ(QelModelBuilder::SwitchLightLoadMode(m.part1, false), S_OK);
 }
 
 TEST(QelModelLifetimeTest, DroppedModelLeavesNoObjectAlive) {
@@ -228,8 +229,8 @@ TEST(QelModelBuilderTest, RefusesObjectsOfAnotherModelOrKind) {
   Assembly m;
   QelModelBuilder other;
   QelAssertionCapture capture;
-  EXPECT_FALSE(other.AddAnnotation(m.set1.get(), {.alias = "X"}));
-  EXPECT_FALSE(m.b.AddSet(m.set1.get(), {.alias = "X"}));
-  EXPECT_FALSE(m.b.AddCapture(m.set2.get(), {.alias = "X", .view = m.v1.get()}));
+  EXPECT_FALSE(other.AddAnnotation(m.set1, {.alias = "X"}));
+  EXPECT_FALSE(m.b.AddSet(m.set1, {.alias = "X"}));
+  EXPECT_FALSE(m.b.AddCapture(m.set2, {.alias = "X", .view = m.v1.get()}));
   EXPECT_EQ(capture.Count(kQelAssertKindBool), 3);
 }

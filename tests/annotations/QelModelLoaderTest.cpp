@@ -24,13 +24,13 @@ const std::string kSample = std::string(QEL_SOURCE_DIR) + "/data/sample-product.
 
 int TypeCode(QelBaseUnknown* annotation) {
   QelBaseUnknown_var owner;
-  if (QelVar<QelITPS> tps = annotation) tps->GetTypeServices(owner);
-  else if (QelVar<QelILumGeometry> geometry = annotation) geometry->GetTypeServices(owner);
-  QelVar<QelITPSTypeClassifier> classifier = owner.get();
+  if (QelVar<QelITPS> tps{annotation}) tps->GetTypeServices(owner);
+  else if (QelVar<QelILumGeometry> geometry{annotation}) geometry->GetTypeServices(owner);
+  QelVar<QelITPSTypeClassifier> classifier(owner.get());
   QelBaseUnknown_var type;
   if (classifier) classifier->GetType(annotation, type);
   int code = 0;
-  if (QelVar<QelITPSType> t = type.get()) t->GetTypeCode(code);
+  if (QelVar<QelITPSType> t{type.get()}) t->GetTypeCode(code);
   return code;
 }
 
@@ -89,7 +89,7 @@ TEST(QelModelLoaderTest, SampleLoadsWithTheStatedCounts) {
   int views = 0, captures = 0, withoutCamera = 0;
   std::map<std::string, int> usesPerView;
   for (const auto& o : viewsAndCaptures) {
-    if (QelVar<QelILumCapture> c = o.get()) {
+    if (QelVar<QelILumCapture> c{o.get()}) {
       ++captures;
       QelVar<QelICamera> camera;
       if (c->GetCamera(camera) != S_OK) ++withoutCamera;
@@ -165,7 +165,7 @@ TEST(QelModelLoaderTest, ModelFromTextKeepsSetStructure) {
   QelListValQelBaseUnknown_var sets;
   QelRovFacetServices::ListAllSets(root.get(), sets, false);
   ASSERT_EQ(sets.Size(), 1);
-  QelVar<QelILumSet> set = sets[1].get();
+  QelVar<QelILumSet> set(sets[1].get());
   QelVar<QelILumCollection> views;
   set->GetViews(views);
   uint32_t count = 0;

@@ -21,7 +21,7 @@ void ExpectNear(const QelMathVector& actual, const QelMathVector& expected) {
 }
 
 QelVar<QelPathElement> PathOf(std::initializer_list<QelBaseUnknown*> elements) {
-  auto path = QelVar<QelPathElement>::Adopt(new QelPathElement());
+  auto path = QelMakeVar<QelPathElement>();
   for (QelBaseUnknown* e : elements) path->AddChildElement(e);
   return path;
 }
@@ -60,7 +60,7 @@ std::string Refusal(const std::string& rootBody) {
 
 QelMathTransformation PlacementOf(QelBaseUnknown* product) {
   QelMathTransformation placement = QelMathTransformation::Translation({7, 7, 7});
-  QelVar<QelIPLMNavOccurrence> occurrence = product;
+  QelVar<QelIPLMNavOccurrence> occurrence(product);
   EXPECT_TRUE(occurrence);
   if (occurrence) {
     EXPECT_EQ(occurrence->GetPlacement(placement), S_OK);
@@ -120,7 +120,7 @@ TEST(QelPartPlacementTest, LoadedPlacementsDefaultPerKeyNestAndMayBeSmall) {
                                      "good.json", root, error),
             S_OK)
       << error;
-  QelVar<QelIPLMNavOccurrence> r = root.get();
+  QelVar<QelIPLMNavOccurrence> r(root.get());
   QelListValQelBaseUnknown_var level1, level2;
   r->ListChildren(level1);
   ASSERT_EQ(level1.Size(), 1);

@@ -12,8 +12,8 @@ class CallbackManagerTest : public ::testing::Test {
  protected:
   void SetUp() override {
     baseline_ = QelBaseUnknown::LiveObjectCount();
-    publisher_ = QelVar<TestAnimal>::Adopt(TestAnimal::Create("publisher"));
-    subscriber_ = QelVar<TestAnimal>::Adopt(TestAnimal::Create("subscriber"));
+    publisher_ = TestAnimal::Create("publisher");
+    subscriber_ = TestAnimal::Create("subscriber");
   }
   void TearDown() override {
     manager_.RemoveCallbacksOn(nullptr, subscriber_.get());
@@ -55,7 +55,7 @@ TEST_F(CallbackManagerTest, CallbackRemovingItselfAndTheNextDuringDispatchIsSafe
 TEST_F(CallbackManagerTest, SubscriberThatDiedIsSkippedAndNotKeptAlive) {
   QelBaseUnknown_WR weak;
   {
-    auto shortLived = QelVar<TestAnimal>::Adopt(TestAnimal::Create("short"));
+    auto shortLived = TestAnimal::Create("short");
     weak = QelBaseUnknown_WR(shortLived);
     manager_.AddCallback(publisher_.get(), "N", shortLived.get(), [&](auto*, auto*) { calls_.push_back("dead"); });
   }
@@ -81,7 +81,7 @@ TEST_F(CallbackManagerTest, SubscriberRemovesItsCallbacksFromItsOwnDestructor) {
 }
 
 TEST_F(CallbackManagerTest, RemoveCallbacksOnSelectsBySubscriberAndName) {
-  auto other = QelVar<TestAnimal>::Adopt(TestAnimal::Create("other"));
+  auto other = TestAnimal::Create("other");
   manager_.AddCallback(publisher_.get(), "A", subscriber_.get(), [&](auto*, auto*) { calls_.push_back("sa"); });
   manager_.AddCallback(publisher_.get(), "B", subscriber_.get(), [&](auto*, auto*) { calls_.push_back("sb"); });
   manager_.AddCallback(publisher_.get(), "A", other.get(), [&](auto*, auto*) { calls_.push_back("oa"); });
@@ -94,7 +94,7 @@ TEST_F(CallbackManagerTest, RemoveCallbacksOnSelectsBySubscriberAndName) {
 }
 
 TEST_F(CallbackManagerTest, PayloadAndPublisherReachTheCallback) {
-  auto payload = QelVar<TestAnimal>::Adopt(TestAnimal::Create("payload"));
+  auto payload = TestAnimal::Create("payload");
   manager_.AddCallback(publisher_.get(), "N", nullptr, [&](QelBaseUnknown* from, QelBaseUnknown* what) {
     calls_.push_back(QelSysDynamicCast<TestAnimal>(from)->Greet() + "/" + QelSysDynamicCast<TestAnimal>(what)->Greet());
   });

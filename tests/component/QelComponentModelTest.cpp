@@ -7,6 +7,11 @@
 
 namespace {
 
+class FrameLikeObject : public QelBaseUnknown {
+ protected:
+  ~FrameLikeObject() override = default;
+};
+
 class ComponentModelTest : public ::testing::Test {
  protected:
   void SetUp() override {
@@ -31,15 +36,15 @@ TEST_F(ComponentModelTest, InterfaceIdentifiersParseAndPrintBack) {
 }
 
 TEST_F(ComponentModelTest, HandleAssignmentQueriesAndIsNullWhenAbsent) {
-  auto animal = QelVar<TestAnimal>::Adopt(TestAnimal::Create("cat"));
-  QelVar<ITestGreeter> greeter = animal.get();
+  auto animal = TestAnimal::Create("cat");
+  QelVar<ITestGreeter> greeter(animal.get());
   ASSERT_TRUE(greeter);
   EXPECT_EQ(greeter->Greet(), "I am cat");
 
   QelDictionary::Get().RemoveFramework("Tests");  // no tie for ITestCounter now
-  QelVar<ITestCounter> counter = animal.get();
+  QelVar<ITestCounter> counter(animal.get());
   EXPECT_FALSE(counter);
-  QelVar<TestDog> notADog = animal.get();
+  QelVar<TestDog> notADog(animal.get());
   EXPECT_FALSE(notADog);
 }
 
@@ -47,7 +52,7 @@ TEST_F(ComponentModelTest, WeakReferenceDiesWithItsObjectAndNeverKeepsItAlive) {
   QelBaseUnknown_WR weak;
   QelBaseUnknown_WR copy;
   {
-    auto animal = QelVar<TestAnimal>::Adopt(TestAnimal::Create("cat"));
+    auto animal = TestAnimal::Create("cat");
     weak = QelBaseUnknown_WR(animal);
     copy = weak;
     ASSERT_TRUE(weak.IsAlive());
@@ -60,10 +65,10 @@ TEST_F(ComponentModelTest, WeakReferenceDiesWithItsObjectAndNeverKeepsItAlive) {
 }
 
 TEST_F(ComponentModelTest, WeakReferenceMadeFromATieFollowsTheImplementation) {
-  auto animal = QelVar<TestAnimal>::Adopt(TestAnimal::Create("cat"));
+  auto animal = TestAnimal::Create("cat");
   QelBaseUnknown_WR weak;
   {
-    QelVar<ITestCounter> tie = animal.get();
+    QelVar<ITestCounter> tie(animal.get());
     ASSERT_TRUE(tie);
     weak = QelBaseUnknown_WR(tie);
   }  // the tie is gone, the animal is not
@@ -75,16 +80,16 @@ TEST_F(ComponentModelTest, TieKeepsItsImplementationAliveAndReleasesIt) {
   QelBaseUnknown_WR weak;
   QelVar<ITestCounter> counter;
   {
-    auto animal = QelVar<TestAnimal>::Adopt(TestAnimal::Create("cat"));
+    auto animal = TestAnimal::Create("cat");
     weak = QelBaseUnknown_WR(animal);
-    counter = animal.get();
+    counter = QelVar<ITestCounter>(animal.get());
   }
   ASSERT_TRUE(weak.IsAlive()) << "the tie must hold its implementation";
   EXPECT_EQ(counter->Next(), 1);
   EXPECT_EQ(counter->Next(), 2);
 
   // The tie answers the implementation's other interfaces and compares equal to it.
-  QelVar<ITestGreeter> greeter = counter.get();
+  QelVar<ITestGreeter> greeter(counter.get());
   ASSERT_TRUE(greeter);
   EXPECT_TRUE(counter->IsEqual(greeter.get()));
   EXPECT_STREQ(counter->IsA(), "TestAnimal");
@@ -96,15 +101,15 @@ TEST_F(ComponentModelTest, TieKeepsItsImplementationAliveAndReleasesIt) {
 }
 
 TEST_F(ComponentModelTest, TieOfABaseClassServesDerivedClasses) {
-  auto dog = QelVar<TestDog>::Adopt(TestDog::Create());
-  QelVar<ITestCounter> counter = dog.get();
+  auto dog = TestDog::Create();
+  QelVar<ITestCounter> counter(dog.get());
   ASSERT_TRUE(counter);
   EXPECT_EQ(counter->Next(), 1);
   EXPECT_EQ(dog->count, 1);
 }
 
 TEST_F(ComponentModelTest, IsAKindOfWalksTheBaseChain) {
-  auto dog = QelVar<TestDog>::Adopt(TestDog::Create());
+  auto dog = TestDog::Create();
   EXPECT_STREQ(dog->IsA(), "TestDog");
   EXPECT_TRUE(dog->IsAKindOf("TestDog"));
   EXPECT_TRUE(dog->IsAKindOf("TestAnimal"));
@@ -115,23 +120,89 @@ TEST_F(ComponentModelTest, IsAKindOfWalksTheBaseChain) {
   EXPECT_EQ(&QelMetaObject::Declare("TestDog", QelMetaKind::Implementation, nullptr, "Other"), &TestDog::MetaObject());
 }
 
-TEST_F(ComponentModelTest, BalancedAddRefAndReleaseInsideADestructorDeletesOnce) {
-  // The count is held up during destruction: a balanced AddRef/Release there is harmless.
-  class SelfTouching : public QelBaseUnknown {
+// A destructor may touch its object's count in balance; anything else is reported once the
+// last destructor has run, and the object is still freed exactly once.
+TEST_F(ComponentModelTest, DestructorsMustLeaveTheCountBalanced) {
+  class Touching : public QelBaseUnknown {
    public:
-    ~SelfTouching() override {
-      AddRef();
-      Release();
+    explicit Touching(int adds, int releases) : adds_(adds), releases_(releases) {}
+
+   protected:
+    ~Touching() override {
+      for (int i = 0; i < adds_; ++i) AddRef();
+      for (int i = 0; i < releases_; ++i) Release();
     }
+
+   private:
+    int adds_, releases_;
   };
+  struct Case {
+    int adds, releases;
+    const char* report;
+  };
+  for (Case c : {Case{1, 1, nullptr}, Case{0, 1, "release past zero"}, Case{1, 0, "reference kept on a destroyed object"}}) {
+    QelAssertionCapture capture;
+    QelMakeVar<Touching>(c.adds, c.releases);
+    EXPECT_EQ(capture.Count(), c.report ? 1 : 0) << c.adds << "/" << c.releases;
+    if (c.report) {
+      EXPECT_EQ(capture.Count(kQelAssertKindBool, c.report), 1);
+    }
+  }
+}
+
+// Ownership is explicit: a raw pointer never turns into a handle silently, and a handle
+// that retains an object nobody adopted (the creation reference would leak) is reported.
+TEST_F(ComponentModelTest, FirstReferenceIsAdoptedNeverRetained) {
+  static_assert(!std::is_convertible_v<TestAnimal*, QelVar<TestAnimal>>);
+  static_assert(!std::is_convertible_v<QelBaseUnknown*, QelBaseUnknown_var>);
+  static_assert(!std::is_assignable_v<QelBaseUnknown_var&, QelBaseUnknown*>);
+  static_assert(!std::is_destructible_v<TestAnimal> && !std::is_destructible_v<ITestGreeter>);
+  {
+    QelAssertionCapture capture;
+    auto made = QelMakeVar<FrameLikeObject>();
+    QelBaseUnknown_var copy = made;
+    auto* raw = new FrameLikeObject;
+    raw->Release();  // giving the first reference back is fine too
+    EXPECT_EQ(capture.Count(), 0);
+  }
   QelAssertionCapture capture;
-  (new SelfTouching)->Release();
-  EXPECT_EQ(capture.Count(), 0);
+  auto* orphan = new FrameLikeObject;
+  {
+    QelBaseUnknown_var leaking(orphan);  // adds a second reference; the first has no owner
+    EXPECT_EQ(capture.Count(kQelAssertKindBool, "first reference not adopted"), 1);
+  }
+  orphan->Release();
+}
+
+// `cur = cur->next` must read the next node before the old one (which owns it) goes.
+TEST_F(ComponentModelTest, AssigningAHandleFromWhatItHoldsKeepsTheSourceAlive) {
+  class Node : public QelBaseUnknown {
+   public:
+    QelVar<Node> next;
+    int value = 0;
+
+   protected:
+    ~Node() override = default;
+  };
+  QelVar<Node> head;
+  for (int i = 3; i >= 1; --i) {
+    auto node = QelMakeVar<Node>();
+    node->value = i;
+    node->next = head;
+    head = node;
+  }
+  int sum = 0;
+  for (QelVar<Node> cur = std::move(head); cur; cur = cur->next) sum += cur->value;
+  EXPECT_EQ(sum, 6);  // and TearDown finds no node left behind
+  QelVar<Node> self = QelMakeVar<Node>();
+  self = self;  // self-assignment keeps the object
+  ASSERT_TRUE(self);
+  EXPECT_EQ(self->value, 0);
 }
 
 TEST_F(ComponentModelTest, NamedComponentIsInstantiatedWithTheRequestedInterface) {
   QelDictionary::Get().RegisterNamedCreator(
-      "TestZoo", []() -> QelBaseUnknown* { return TestAnimal::Create("zoo"); }, "Tests");
+      "TestZoo", []() -> QelBaseUnknown* { return TestAnimal::Create("zoo").Detach(); }, "Tests");
   QelVar<ITestGreeter> greeter = QelInstantiateComponent<ITestGreeter>("TestZoo");
   ASSERT_TRUE(greeter);
   EXPECT_EQ(greeter->Greet(), "I am zoo");

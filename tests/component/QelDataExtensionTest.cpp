@@ -71,15 +71,15 @@ class DataExtensionTest : public ::testing::Test {
 
 TEST_F(DataExtensionTest, ExtensionIsCreatedOnceAndSharedByLaterQueries) {
   // An animal that is not of the late type gets no extension.
-  auto cat = QelVar<TestAnimal>::Adopt(TestAnimal::Create("cat"));
-  QelVar<ITestCounter> none = cat.get();
+  auto cat = TestAnimal::Create("cat");
+  QelVar<ITestCounter> none(cat.get());
   EXPECT_FALSE(none);
   EXPECT_EQ(g_extensionsCreated, 0);
 
-  auto dog = QelVar<TestDog>::Adopt(TestDog::Create());
+  auto dog = TestDog::Create();
   EXPECT_EQ(g_extensionsCreated, 0) << "nothing is created before the first query";
-  QelVar<ITestCounter> first = dog.get();
-  QelVar<ITestCounter> second = dog.get();
+  QelVar<ITestCounter> first(dog.get());
+  QelVar<ITestCounter> second(dog.get());
   ASSERT_TRUE(first && second);
   EXPECT_EQ(g_extensionsCreated, 1);
   first->Next();
@@ -87,8 +87,8 @@ TEST_F(DataExtensionTest, ExtensionIsCreatedOnceAndSharedByLaterQueries) {
 }
 
 TEST_F(DataExtensionTest, ObjectOwnInterfacesWinOverItsExtensions) {
-  auto dog = QelVar<TestDog>::Adopt(TestDog::Create());
-  QelVar<ITestGreeter> greeter = dog.get();
+  auto dog = TestDog::Create();
+  QelVar<ITestGreeter> greeter(dog.get());
   ASSERT_TRUE(greeter);
   EXPECT_EQ(greeter->Greet(), "I am dog");
   EXPECT_EQ(g_extensionsCreated, 0);
@@ -97,9 +97,9 @@ TEST_F(DataExtensionTest, ObjectOwnInterfacesWinOverItsExtensions) {
 TEST_F(DataExtensionTest, ExtensionLivesAsLongAsItsObject) {
   QelBaseUnknown_WR extensionWeak;
   {
-    auto dog = QelVar<TestDog>::Adopt(TestDog::Create());
+    auto dog = TestDog::Create();
     {
-      QelVar<ITestCounter> counter = dog.get();
+      QelVar<ITestCounter> counter(dog.get());
       extensionWeak = QelBaseUnknown_WR(counter);
     }
     EXPECT_TRUE(extensionWeak.IsAlive()) << "the object keeps its extension after the tie is dropped";
@@ -110,10 +110,10 @@ TEST_F(DataExtensionTest, ExtensionLivesAsLongAsItsObject) {
 TEST_F(DataExtensionTest, ExtensionHeldBeyondItsObjectSeesTheObjectGone) {
   QelVar<ITestCounter> counter;
   {
-    auto dog = QelVar<TestDog>::Adopt(TestDog::Create());
-    counter = dog.get();
+    auto dog = TestDog::Create();
+    counter = QelVar<ITestCounter>(dog.get());
   }
-  QelVar<ITestGreeter> greeter = counter.get();
+  QelVar<ITestGreeter> greeter(counter.get());
   ASSERT_TRUE(greeter);
   EXPECT_EQ(greeter->Greet(), "orphan");
 }
@@ -123,7 +123,7 @@ TEST_F(DataExtensionTest, ObjectInDestructionGetsNoNewExtension) {
   class Queried : public TestDog {
    public:
     ~Queried() override {
-      QelVar<ITestCounter> late = static_cast<QelBaseUnknown*>(this);
+      QelVar<ITestCounter> late(static_cast<QelBaseUnknown*>(this));
       found = static_cast<bool>(late);
     }
     bool found = true;

@@ -12,8 +12,8 @@ class ListTest : public ::testing::Test {
   void SetUp() override {
     baseline_ = QelBaseUnknown::LiveObjectCount();
     QelDictionary::Get().Register("TestAnimal", ITestCounter::IID, &QelCreateTie<TieCounterOfAnimal>, "Tests");
-    a_ = QelVar<TestAnimal>::Adopt(TestAnimal::Create("a"));
-    b_ = QelVar<TestAnimal>::Adopt(TestAnimal::Create("b"));
+    a_ = TestAnimal::Create("a");
+    b_ = TestAnimal::Create("b");
   }
   void TearDown() override {
     a_ = nullptr;
@@ -44,7 +44,7 @@ TEST_F(ListTest, LocateAndRemoveTreatATieAsItsImplementation) {
   QelListValQelBaseUnknown_var list;
   list.Append(a_.get());
   list.Append(b_.get());
-  QelVar<ITestCounter> tieOfB = b_.get();
+  QelVar<ITestCounter> tieOfB(b_.get());
   ASSERT_TRUE(tieOfB);
   EXPECT_EQ(list.Locate(tieOfB.get()), 2);
   EXPECT_EQ(list.Locate(nullptr), 0);
@@ -55,7 +55,7 @@ TEST_F(ListTest, LocateAndRemoveTreatATieAsItsImplementation) {
 
 TEST_F(ListTest, RemoveDuplicatesKeepsFirstOccurrencesInOrder) {
   QelListValQelBaseUnknown_var list;
-  QelVar<ITestCounter> tieOfA = a_.get();
+  QelVar<ITestCounter> tieOfA(a_.get());
   list.Append(b_.get());
   list.Append(a_.get());
   list.Append(QelBaseUnknown_var());
@@ -73,7 +73,7 @@ TEST_F(ListTest, ListHoldsItsEntries) {
   QelBaseUnknown_WR weak;
   QelListValQelBaseUnknown_var list;
   {
-    auto c = QelVar<TestAnimal>::Adopt(TestAnimal::Create("c"));
+    auto c = TestAnimal::Create("c");
     weak = QelBaseUnknown_WR(c);
     list.Append(c.get());
   }

@@ -12,6 +12,9 @@ class ITestGreeter : public virtual QelBaseUnknown {
   using QelInterfaceSelf = ITestGreeter;
   static constexpr QelIID IID = QelIID::Parse("{11111111-2222-3333-4444-555555555555}");
   virtual std::string Greet() = 0;
+
+ protected:
+  ~ITestGreeter() override = default;
 };
 
 class ITestCounter : public virtual QelBaseUnknown {
@@ -19,12 +22,15 @@ class ITestCounter : public virtual QelBaseUnknown {
   using QelInterfaceSelf = ITestCounter;
   static constexpr QelIID IID = QelIID::Parse("{11111111-2222-3333-4444-666666666666}");
   virtual int Next() = 0;
+
+ protected:
+  ~ITestCounter() override = default;
 };
 
 // Implements ITestGreeter directly; ITestCounter only through a tie registered by tests.
 class TestAnimal : public ITestGreeter {
  public:
-  static TestAnimal* Create(std::string name) { return new TestAnimal(std::move(name)); }
+  static QelVar<TestAnimal> Create(std::string name) { return QelVar<TestAnimal>::Adopt(new TestAnimal(std::move(name))); }
   static const QelMetaObject& MetaObject() {
     static const QelMetaObject& meta =
         QelMetaObject::Declare("TestAnimal", QelMetaKind::Implementation, &QelBaseUnknown::MetaObject(), "Tests");
@@ -48,7 +54,7 @@ class TestAnimal : public ITestGreeter {
 
 class TestDog : public TestAnimal {
  public:
-  static TestDog* Create() { return new TestDog; }
+  static QelVar<TestDog> Create() { return QelVar<TestDog>::Adopt(new TestDog); }
   static const QelMetaObject& MetaObject() {
     static const QelMetaObject& meta =
         QelMetaObject::Declare("TestDog", QelMetaKind::Implementation, &TestAnimal::MetaObject(), "Tests");

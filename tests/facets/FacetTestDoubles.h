@@ -84,5 +84,5 @@ class TestFacetGroup : public QelRovFacetGroup {
 
 template <class T, class... Args>
 QelVar<T> Make(Args&&... args) {
-  return QelVar<T>::Adopt(new T(std::forward<Args>(args)...));
+  return QelMakeVar<T>(std::forward<Args>(args)...);
 }

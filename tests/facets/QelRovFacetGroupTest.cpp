@@ -16,14 +16,14 @@ QelVar<QelFrmEditor> EditorOn(QelBaseUnknown* root) { return Make<QelFrmEditor>(
 QelBaseUnknown_var AddPart(QelModelBuilder& builder) {
   QelModelProductDesc desc;
   desc.alias = "Part1";
-  return builder.AddProduct(builder.Root().get(), desc);
+  return builder.AddProduct(builder.Root(), desc);
 }
 
 void AddSet(QelModelBuilder& builder, QelBaseUnknown* owner, const char* alias, bool light) {
   QelModelSetDesc desc;
   desc.alias = alias;
   desc.light = light;
-  builder.AddSet(owner, desc);
+  builder.AddSet(QelBaseUnknown_var(owner), desc);
 }
 
 TEST(QelRovFacetGroupRecord, RootAndFilterDataComeFromTheLiveGroupOnly) {
@@ -70,13 +70,13 @@ TEST(QelRovFacetGroupRecord, SubscribesOnceToLightSetOwnersAndHearsTheirSwitch) 
 
   // Without facets the group reports its rebuild cannot run: proof the switch arrived.
   QelAssertionCapture capture;
-  QelModelBuilder::SwitchLightLoadMode(part.get(), true);
+  QelModelBuilder::SwitchLightLoadMode(part, true);
   EXPECT_EQ(capture.Count(kQelAssertKindPointer, "facet"), 1);
   EXPECT_EQ(group->GetObservables().Size(), 1);
 
   group->RemoveLightLoadModeObservers();
   EXPECT_EQ(group->GetObservables().Size(), 0);
-  QelModelBuilder::SwitchLightLoadMode(part.get(), false);
+  QelModelBuilder::SwitchLightLoadMode(part, false);
   EXPECT_EQ(capture.Count(), 1);
 }
 
@@ -124,7 +124,7 @@ TEST(QelRovFacetGroupLifetime, GroupWithFacetsAndItemsDroppedLeavesNothingAlive)
     auto p = Make<TestProperty>("p", facet.get());
     facet->Add(p.get());
     p->SetCheck(true);
-    QelVar<QelILumLightLoadModeObserver> observer = static_cast<QelBaseUnknown*>(group.get());
+    QelVar<QelILumLightLoadModeObserver> observer(static_cast<QelBaseUnknown*>(group.get()));
     EXPECT_TRUE(observer);
   }
   EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), before);

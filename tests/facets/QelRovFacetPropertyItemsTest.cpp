@@ -55,28 +55,28 @@ class QelRovFacetPropertyItems : public ::testing::Test {
     QelModelProductDesc part;
     part.alias = "Part1";
     part.icon = "I_Part";
-    owner = builder.AddProduct(builder.Root().get(), part);
+    owner = builder.AddProduct(builder.Root(), part);
     QelModelSetDesc setDesc;
     setDesc.alias = "Set.1";
-    set = builder.AddSet(owner.get(), setDesc);
+    set = builder.AddSet(owner, setDesc);
     QelModelAnnotationDesc desc;
     desc.alias = "Datum.1";
     desc.navigationNames = {"A", "B"};
     desc.icon = "I_Datum";
     desc.typeName = "Datum";
-    datum = builder.AddAnnotation(set.get(), desc);
+    datum = builder.AddAnnotation(set, desc);
     desc.navigationNames.clear();
     desc.typeName = "Tol";
     desc.shown = false;
     for (const char* alias : {"T1", "T2", "T3"}) {
       desc.alias = alias;
-      tols.push_back(builder.AddAnnotation(set.get(), desc));
+      tols.push_back(builder.AddAnnotation(set, desc));
     }
     QelModelViewDesc viewDesc;
     viewDesc.alias = "View.1";
     viewDesc.icon = "I_View";
     viewDesc.shown = false;
-    view = builder.AddView(set.get(), viewDesc);
+    view = builder.AddView(set, viewDesc);
     root = builder.Finish();
   }
   QelModelBuilder builder;
@@ -126,7 +126,7 @@ TEST_F(QelRovFacetPropertyItems, AnnotationItemPrefersItsFirstNavigationName) {
 }
 
 TEST_F(QelRovFacetPropertyItems, TypeItemStartsUncheckedAndAppliesEveryAnnotation) {
-  QelModelBuilder::SetShown(tols[1].get(), true);
+  QelModelBuilder::SetShown(tols[1], true);
   auto item = Make<QelRovFacetPropertyItemTypeAnnot>(QelUnicodeString("Tol"), filter.get(), group.get());
   EXPECT_EQ(item->GetCheckState(), Unchecked);  // whatever the display shows
   for (auto& tol : tols) item->AddAnnotation(tol.get());
@@ -137,7 +137,7 @@ TEST_F(QelRovFacetPropertyItems, TypeItemStartsUncheckedAndAppliesEveryAnnotatio
   item->SetCheckState(Unchecked);
   EXPECT_EQ(item->ApplyCheckState(), S_OK);
   for (auto& tol : tols) EXPECT_FALSE(Shown(tol.get()));
-  QelModelBuilder::SetShown(tols[0].get(), true);
+  QelModelBuilder::SetShown(tols[0], true);
   EXPECT_EQ(item->RefreshCheckState(), S_OK);  // no object: state stays
   EXPECT_EQ(item->GetCheckState(), Unchecked);
 }

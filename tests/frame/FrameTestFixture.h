@@ -24,11 +24,11 @@ class FrameTest : public ::testing::Test {
   // A window of kind W on `editor`, listed in the layout; the layout holds it.
   template <class W>
   W* AddWindow(QelFrmEditor* editor) {
-    auto window = QelVar<W>::Adopt(new W(editor));
+    auto window = QelMakeVar<W>(editor);
     layout_->AddWindow(window.get());
     return window.get();
   }
-  static QelVar<QelFrmEditor> NewEditor() { return QelVar<QelFrmEditor>::Adopt(new QelFrmEditor); }
+  static QelVar<QelFrmEditor> NewEditor() { return QelMakeVar<QelFrmEditor>(); }
 
   QelApplicationFrame* frame_ = nullptr;
   QelFrmLayout* layout_ = nullptr;

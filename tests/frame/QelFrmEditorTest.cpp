@@ -10,7 +10,7 @@ namespace {
 using EditorTest = FrameTest;
 
 QelVar<QelPathElement> PathOf(std::initializer_list<QelBaseUnknown*> objects) {
-  auto path = QelVar<QelPathElement>::Adopt(new QelPathElement);
+  auto path = QelMakeVar<QelPathElement>();
   for (QelBaseUnknown* object : objects) path->AddChildElement(object);
   return path;
 }
@@ -81,7 +81,7 @@ TEST_F(EditorTest, PathCursorWalksFromTheLeafTowardsTheRoot) {
   path->InitToRootElement();
   EXPECT_EQ(path->NextChildElement().get(), root.get());
 
-  auto empty = QelVar<QelPathElement>::Adopt(new QelPathElement);
+  auto empty = QelMakeVar<QelPathElement>();
   empty->InitToLeafElement();
   EXPECT_EQ(empty->NextFatherElement().get(), nullptr);
   EXPECT_EQ(empty->GetLeaf().get(), nullptr);
@@ -89,7 +89,7 @@ TEST_F(EditorTest, PathCursorWalksFromTheLeafTowardsTheRoot) {
 
 TEST_F(EditorTest, NullPathElementIsABrokenContractAndIsNotAdded) {
   QelAssertionCapture capture;
-  auto path = QelVar<QelPathElement>::Adopt(new QelPathElement);
+  auto path = QelMakeVar<QelPathElement>();
   path->AddChildElement(nullptr);
   EXPECT_EQ(path->GetSize(), 0);
   EXPECT_EQ(capture.Count(kQelAssertKindPointer), 1);
@@ -101,7 +101,7 @@ TEST_F(EditorTest, EditorReleasesRootSelectionAndPathWhenItGoes) {
     auto root = NewObject(), selected = NewObject();
     rootWeak = root.get();
     selectedWeak = selected.get();
-    auto editor = QelVar<QelFrmEditor>::Adopt(new QelFrmEditor(root.get()));
+    auto editor = QelMakeVar<QelFrmEditor>(root.get());
     csoWeak = editor->GetCSO();
     editor->SetSelection(selected.get());
     editor->SetUIActivePath(PathOf({root.get(), selected.get()}).get());

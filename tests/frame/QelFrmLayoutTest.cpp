@@ -63,7 +63,7 @@ TEST_F(LayoutTest, ActivationIsAnnouncedOnceAndTheCurrentEditorFollows) {
   EXPECT_EQ(QelFrmEditor::GetCurrentEditor(), first.get());
   EXPECT_EQ(layout_->SetCurrentWindow(b), S_OK);
   EXPECT_EQ(QelFrmEditor::GetCurrentEditor(), second.get());
-  auto stranger = QelVar<Qel3DWindow>::Adopt(new Qel3DWindow(first.get()));
+  auto stranger = QelMakeVar<Qel3DWindow>(first.get());
   EXPECT_EQ(layout_->SetCurrentWindow(stranger.get()), E_FAIL) << "a window outside the layout";
   EXPECT_EQ(activated, (std::vector<QelBaseUnknown*>{a, b}));
   EXPECT_EQ(frame_->RemoveCallbacksOn(layout_, subscriber.get()), 1);

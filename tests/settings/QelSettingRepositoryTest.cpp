@@ -265,7 +265,7 @@ TEST_F(SettingRepositoryTest, RepositoryModifiedCarriesTheSettingName) {
   QelCallbackId id = QelCallbackManager::Get().AddCallback(
       repo, kQelRepositoryModified, nullptr, [&](QelBaseUnknown* publisher, QelBaseUnknown* notification) {
         publisherSeen = publisher;
-        QelVar<QelSettingNotif> notif = notification;
+        QelVar<QelSettingNotif> notif(notification);
         names.push_back(notif ? notif->GetName().Str() : "<not a QelSettingNotif>");
         int value = -1;
         // Subscribers see the new value already stored.

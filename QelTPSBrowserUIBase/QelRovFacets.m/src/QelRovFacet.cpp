@@ -72,7 +72,7 @@ HRESULT QelRovFacet::OnPropertyChanged(QelBaseUnknown* property) {
     }
   }
   if (ApplyPropertyChange(property) == S_OK) {
-    QelVar<QelIRovFacetPropertyObserver> group = group_.Get().get();
+    QelVar<QelIRovFacetPropertyObserver> group(group_.Get().get());
     if (!group) {
       QelAssertNullHandler();
       return E_UNEXPECTED;

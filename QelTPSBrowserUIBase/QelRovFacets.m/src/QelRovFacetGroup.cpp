@@ -82,22 +82,22 @@ void QelRovFacetGroup::AddLightLoadModeObservers() {
   if (!root) return;
   QelBaseUnknown_var made;
   QelLumInstantiateComponentBase(kSetComponent, made);
-  QelVar<QelILumSetComponent> component = made.get();
+  QelVar<QelILumSetComponent> component(made.get());
   if (!component) {
     QelAssertPointer("QelILumSetComponent");
     return;
   }
   QelListValQelBaseUnknown_var sets;
   QelRovFacetServices::ListAllSets(root.get(), sets, false);
-  QelVar<QelILumLightLoadModeObserver> self = static_cast<QelBaseUnknown*>(this);
+  QelVar<QelILumLightLoadModeObserver> self(static_cast<QelBaseUnknown*>(this));
   for (int i = 1; i <= sets.Size(); ++i) {
-    QelVar<QelILumSet> set = sets[i].get();
+    QelVar<QelILumSet> set(sets[i].get());
     if (!set) continue;
-    QelVar<QelITPSLightSet> lightSet = set.get();
+    QelVar<QelITPSLightSet> lightSet(set.get());
     if (!lightSet) continue;
     QelBaseUnknown_var owner;
     component->GetSetOwner(sets[i].get(), owner);
-    QelVar<QelILumLightLoadModeObservable> observable = owner.get();
+    QelVar<QelILumLightLoadModeObservable> observable(owner.get());
     // A null handle takes its place too, so the list mirrors the light sets.
     observables_.Append(static_cast<QelBaseUnknown*>(observable.get()));
     owner = nullptr;
@@ -110,9 +110,9 @@ void QelRovFacetGroup::AddLightLoadModeObservers() {
 }
 
 void QelRovFacetGroup::RemoveLightLoadModeObservers() {
-  QelVar<QelILumLightLoadModeObserver> self = static_cast<QelBaseUnknown*>(this);
+  QelVar<QelILumLightLoadModeObserver> self(static_cast<QelBaseUnknown*>(this));
   for (int i = 1; i <= observables_.Size(); ++i) {
-    QelVar<QelILumLightLoadModeObservable> observable = observables_[i].get();
+    QelVar<QelILumLightLoadModeObservable> observable(observables_[i].get());
     if (!observable) {
       QelAssertNullHandler();
       continue;

@@ -50,7 +50,7 @@ HRESULT QelRovFacetProperty::SetExpandedFlag(bool expanded) {
 }
 
 QelVar<QelIRovFacetPropertyObserver> QelRovFacetProperty::ResolveOwnerObserver() const {
-  QelVar<QelIRovFacetPropertyObserver> observer = owner_.Get().get();
+  QelVar<QelIRovFacetPropertyObserver> observer(owner_.Get().get());
   if (!observer) QelAssertNullHandler();
   return observer;
 }
@@ -81,7 +81,7 @@ HRESULT QelRovFacetProperty::ResolveFilterData(QelVar<QelRovFacetFilterData>& fi
   }
   QelVar<QelIRovFacetPropertyObserver> owner = ResolveOwnerObserver();
   if (!owner) return E_UNEXPECTED;
-  QelVar<QelRovFacet> facet = owner.get();
+  QelVar<QelRovFacet> facet(owner.get());
   if (!facet) {
     QelAssertPointer("QelRovFacet");
     return E_UNEXPECTED;

@@ -33,8 +33,8 @@ QelRovFacetPropertyGroup::QelRovFacetPropertyGroup(const QelUnicodeString& name,
     : QelRovFacetProperty(name, iconName, owner) {
   SetExpandedFlag(false);
   if (withSelectAll)
-    selectAll_ = QelVar<QelRovFacetPropertyItem>::Adopt(new QelRovFacetPropertyItem(
-        QelMsgCatalog::BuildMessage("QelRovLumFacets", "lblSelectAll"), static_cast<QelBaseUnknown*>(this)));
+    selectAll_ = QelMakeVar<QelRovFacetPropertyItem>(
+        QelMsgCatalog::BuildMessage("QelRovLumFacets", "lblSelectAll"), static_cast<QelBaseUnknown*>(this));
 }
 
 QelRovFacetPropertyGroup::~QelRovFacetPropertyGroup() {

@@ -37,7 +37,7 @@ HRESULT QelRovFacetPropertyItem::GetChildren(QelListValQelBaseUnknown_var&) { re
 HRESULT QelRovFacetPropertyItem::UpdateName() { return S_OK; }
 
 bool QelRovFacetPropertyItem::SetIconFrom(QelBaseUnknown* source) {
-  QelVar<QelIIcon> icon = source;
+  QelVar<QelIIcon> icon(source);
   if (!icon) return false;
   QelUnicodeString name;
   icon->GetIconName(name);
@@ -71,7 +71,7 @@ HRESULT QelRovFacetPropertyItem::ApplyToObject(QelRovFacetFilterData* filterData
 }
 
 bool QelRovFacetPropertyItem::AppendAlias(QelUnicodeString& label, QelBaseUnknown* source, const char* separator) {
-  QelVar<QelIAlias> alias = source;
+  QelVar<QelIAlias> alias(source);
   if (!alias) return false;
   QelUnicodeString text;
   alias->GetAlias(text);

@@ -29,12 +29,12 @@ QelRovFacetPropertyItemCustomAnnot::QelRovFacetPropertyItemCustomAnnot(QelBaseUn
     return;
   }
   QelUnicodeString label;
-  if (QelVar<QelINavigateObject> navigate = annotation) {
+  if (QelVar<QelINavigateObject> navigate{annotation}) {
     std::unique_ptr<QelListValQelUnicodeString> names(navigate->GetIdentificators());
     if (names && names->Size() > 0) label = (*names)[1];
   }
   if (label.IsEmpty()) {
-    QelVar<QelIAlias> alias = annotation;
+    QelVar<QelIAlias> alias(annotation);
     if (!alias) {
       QelAssertNullHandler();
       return;

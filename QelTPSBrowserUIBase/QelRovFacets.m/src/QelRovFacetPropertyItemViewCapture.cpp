@@ -26,7 +26,7 @@ QelRovFacetPropertyItemViewCapture::~QelRovFacetPropertyItemViewCapture() = defa
 
 HRESULT QelRovFacetPropertyItemViewCapture::UpdateName() {
   QelUnicodeString label;
-  QelVar<QelIAlias> alias = GetObject().get();
+  QelVar<QelIAlias> alias(GetObject().get());
   if (!alias) {
     QelAssertNullHandler();
     SetName(label);

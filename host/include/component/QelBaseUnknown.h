@@ -1,9 +1,12 @@
 #pragma once
 // QelBaseUnknown: the root of every object the host and the module exchange.
 //
-// Objects are reference counted and start with one reference, owned by their creator.
+// Objects are reference counted and start with one reference, owned by their creator,
+// who adopts it into a handle (QelMakeVar, QelVar::Adopt) or gives it back (Release).
 // They are destroyed by the Release that drops the count to zero, never by `delete`
-// (destructors are protected). Interfaces derive *virtually* from QelBaseUnknown, so an
+// (destructors are non-public; QelVar refuses a counted type whose destructor is public).
+// Debug builds report a reference added to an object whose first reference has no owner
+// yet (`QelVar<T> v(new T)` leaks), and a count left unbalanced by a destructor. Interfaces derive *virtually* from QelBaseUnknown, so an
 // object that implements several interfaces directly still has one count. An interface
 // may also be provided by a tie (a small counted object forwarding to the
 // implementation) or by a data extension; both are found through QelDictionary.
@@ -30,6 +33,9 @@ class QelBaseUnknown {
 
   uint32_t AddRef();
   uint32_t Release();
+  // Records that the first reference has an owner; QelVar::Adopt and the component model
+  // call it where they hand a new reference on.
+  void NoteAdopted() { firstReferenceOwned_ = true; }
 
   // Gives, with a new reference, the pointer for `iid`: the object itself, a tie, or an
   // interface of a data extension of the object's late type. E_NOINTERFACE and a null
@@ -75,6 +81,7 @@ class QelBaseUnknown {
 
   struct Extensions;
   uint32_t refs_ = 1;
+  bool firstReferenceOwned_ = false;
   QelWeakFlag* weak_ = nullptr;
   Extensions* extensions_ = nullptr;
 };

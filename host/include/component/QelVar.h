@@ -1,9 +1,13 @@
 #pragma once
 // QelVar<T>: the counted handle. Ownership is visible where a handle is made:
-//   QelVar<T>::Adopt(p)   takes over a reference the caller already owns;
-//   QelVar<T>::Retain(p)  adds a reference of its own to an object of type T;
-//   QelVar<T> v = object  queries T (for an interface) or casts (for a class); null
-//                         when the object is neither, with no reference taken then.
+//   QelMakeVar<T>(args...)  creates an object and adopts its first reference;
+//   QelVar<T>::Adopt(p)     takes over a reference the caller already owns;
+//   QelVar<T>::Retain(p)    adds a reference of its own to an object of type T;
+//   QelVar<T> v(object)     queries T (for an interface) or casts (for a class) and adds a
+//                           reference; null when the object is neither. Explicit, so that
+//                           `QelVar<T> v = new X;` (a leak) does not compile.
+// Assignment takes its argument by value and swaps, so `p = p->next` reads the source
+// before it lets go of the old object.
 #include <type_traits>
 #include <utility>
 
@@ -17,30 +21,33 @@ class QelVar {
  public:
   QelVar() = default;
   QelVar(std::nullptr_t) {}
-  QelVar(QelBaseUnknown* any) { Assign(any); }
+  explicit QelVar(QelBaseUnknown* any) { Assign(any); }
   QelVar(const QelVar& other) : p_(other.p_) { if (p_) Base(p_)->AddRef(); }
   QelVar(QelVar&& other) noexcept : p_(std::exchange(other.p_, nullptr)) {}
   template <class U>
     requires(!std::is_same_v<U, T>)
   QelVar(const QelVar<U>& other) { Assign(other.get()); }
-  ~QelVar() { Reset(); }
-
-  static QelVar Adopt(T* owned) { QelVar v; v.p_ = owned; return v; }
-  static QelVar Retain(T* p) { if (p) Base(p)->AddRef(); return Adopt(p); }
-
-  QelVar& operator=(const QelVar& other) {
-    if (other.p_) Base(other.p_)->AddRef();
+  ~QelVar() {
+    static_assert(!std::is_destructible_v<T>, "a counted type needs a non-public destructor: only Release deletes");
     Reset();
-    p_ = other.p_;
-    return *this;
   }
-  QelVar& operator=(QelVar&& other) noexcept {
-    if (this != &other) { Reset(); p_ = std::exchange(other.p_, nullptr); }
-    return *this;
+
+  static QelVar Adopt(T* owned) {
+    QelVar v;
+    v.p_ = owned;
+    if (owned) Base(owned)->NoteAdopted();
+    return v;
   }
-  QelVar& operator=(QelBaseUnknown* any) {
-    QelVar fresh(any);
-    return *this = std::move(fresh);
+  static QelVar Retain(T* p) {
+    QelVar v;
+    if (p) Base(p)->AddRef();
+    v.p_ = p;
+    return v;
+  }
+
+  QelVar& operator=(QelVar other) noexcept {
+    std::swap(p_, other.p_);
+    return *this;
   }
   QelVar& operator=(std::nullptr_t) { Reset(); return *this; }
 
@@ -66,7 +73,7 @@ class QelVar {
       p_ = any;
     } else if constexpr (QelInterface<T>) {
       void* out = nullptr;
-      if (any->QueryInterface(T::IID, &out) == S_OK) p_ = static_cast<T*>(out);
+      if (any->QueryInterface(T::IID, &out) == S_OK) p_ = static_cast<T*>(out);  // the query's reference
     } else {
       if (T* cast = dynamic_cast<T*>(any->GetImpl())) { Base(cast)->AddRef(); p_ = cast; }
     }
@@ -76,6 +83,12 @@ class QelVar {
 };
 
 using QelBaseUnknown_var = QelVar<QelBaseUnknown>;
+
+// Creates a T and adopts the one reference it starts with.
+template <class T, class... Args>
+QelVar<T> QelMakeVar(Args&&... args) {
+  return QelVar<T>::Adopt(new T(std::forward<Args>(args)...));
+}
 
 // The implementation object behind `p` as a class pointer, without a reference.
 template <class T>

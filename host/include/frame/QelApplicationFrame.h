@@ -26,7 +26,7 @@ class QelApplicationFrame : public QelBaseUnknown {
   QelBaseUnknown* GetDispatcher() { return this; }
   // The top-level window that dialogs take as parent; null until the toolkit sets one.
   QelBaseUnknown* GetMainWindow() const { return mainWindow_.get(); }
-  void SetMainWindow(QelBaseUnknown* window) { mainWindow_ = window; }
+  void SetMainWindow(QelBaseUnknown* window) { mainWindow_ = QelVar<QelBaseUnknown>(window); }
 
   // Forwarders to QelCallbackManager, for code written against the frame.
   QelCallbackId AddCallback(QelBaseUnknown* publisher, std::string_view notification, QelBaseUnknown* subscriber,

@@ -21,7 +21,7 @@ class QelFrmEditor : public QelBaseUnknown {
   static QelFrmEditor* GetCurrentEditor();
 
   QelBaseUnknown_var GetRootObject() const { return root_; }
-  void SetRootObject(QelBaseUnknown* root) { root_ = root; }
+  void SetRootObject(QelBaseUnknown* root) { root_ = QelVar<QelBaseUnknown>(root); }
 
   // Borrowed; lives as long as the editor.
   QelCSO* GetCSO() const { return cso_.get(); }

@@ -13,7 +13,7 @@ class QelFrmWindow : public QelBaseUnknown {
   QelFrmEditor* GetEditor() const { return editor_.get(); }
   // The window's viewer, null until the host puts one in.
   QelBaseUnknown_var GetViewer() const { return viewer_; }
-  void SetViewer(QelBaseUnknown* viewer) { viewer_ = viewer; }
+  void SetViewer(QelBaseUnknown* viewer) { viewer_ = QelVar<QelBaseUnknown>(viewer); }
 
  protected:
   explicit QelFrmWindow(QelFrmEditor* editor) : editor_(QelVar<QelFrmEditor>::Retain(editor)) {}

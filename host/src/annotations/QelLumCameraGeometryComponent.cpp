@@ -20,11 +20,11 @@ void* QelLumCameraGeometryComponent::QueryDirect(const QelIID& iid) {
 }
 
 HRESULT QelLumCameraGeometryComponent::Bind(QelBaseUnknown* camera, QelPathElement* capturePath) {
-  camera_ = camera;
+  camera_ = QelVar<QelICamera>(camera);
   // A viewer camera handed in is not one of ours: read the stored camera of the capture
   // nearest to the leaf end of the path instead.
   for (int i = capturePath ? capturePath->GetSize() - 1 : -1; !camera_ && i >= 0; --i) {
-    if (QelVar<QelILumCapture> capture = (*capturePath)[i].get()) capture->GetCamera(camera_);
+    if (QelVar<QelILumCapture> capture{(*capturePath)[i].get()}) capture->GetCamera(camera_);
   }
   return camera_ ? S_OK : E_FAIL;
 }

@@ -68,6 +68,6 @@ HRESULT QelLumSetComponent::GetSetOwner(QelBaseUnknown* set, QelBaseUnknown_var&
   owner = nullptr;
   auto* found = QelSysDynamicCast<QelLumAnnotationSet>(set);
   if (!found) return E_FAIL;
-  owner = found->Owner();
+  owner = QelVar<QelBaseUnknown>(found->Owner());
   return owner ? S_OK : E_FAIL;
 }

@@ -27,8 +27,8 @@ struct QelModelBuilder::State {
 };
 
 QelModelBuilder::QelModelBuilder(const QelModelProductDesc& root) : state_(std::make_unique<State>()) {
-  state_->root = QelVar<QelPLMProductOccurrence>::Adopt(new QelPLMProductOccurrence(root.alias, root.icon, root.shown));
-  state_->model = QelVar<QelAnnotationModel>::Adopt(new QelAnnotationModel(state_->root.get()));
+  state_->root = QelMakeVar<QelPLMProductOccurrence>(root.alias, root.icon, root.shown);
+  state_->model = QelMakeVar<QelAnnotationModel>(state_->root.get());
   state_->root->SetModelData(state_->model.get(), true);
   state_->root->SetLightLoadMode(root.lightLoadMode);
 }
@@ -45,7 +45,7 @@ QelBaseUnknown_var QelModelBuilder::AddProduct(const QelBaseUnknown_var& parent,
   if (!state_->model) return nullptr;
   auto* father = state_->Mine<QelPLMProductOccurrence>(parent.get());
   if (!father) return nullptr;
-  auto child = QelVar<QelPLMProductOccurrence>::Adopt(new QelPLMProductOccurrence(desc.alias, desc.icon, desc.shown));
+  auto child = QelMakeVar<QelPLMProductOccurrence>(desc.alias, desc.icon, desc.shown);
   child->SetModelData(state_->model.get(), false);
   child->SetLightLoadMode(desc.lightLoadMode);
   child->SetPlacement(desc.placement);
@@ -57,9 +57,8 @@ QelBaseUnknown_var QelModelBuilder::AddRepInstance(const QelBaseUnknown_var& pro
   if (!state_->model) return nullptr;
   auto* owner = state_->Mine<QelPLMProductOccurrence>(product.get());
   if (!owner) return nullptr;
-  auto reference = QelVar<QelPLMRepReference>::Adopt(
-      new QelPLMRepReference(desc.referenceAlias.empty() ? desc.alias : desc.referenceAlias, "I_RepReference"));
-  auto rep = QelVar<QelPLMRepInstance>::Adopt(new QelPLMRepInstance(owner, desc.alias, desc.icon, reference.get()));
+  auto reference = QelMakeVar<QelPLMRepReference>(desc.referenceAlias.empty() ? desc.alias : desc.referenceAlias, "I_RepReference");
+  auto rep = QelMakeVar<QelPLMRepInstance>(owner, desc.alias, desc.icon, reference.get());
   owner->AddRepInstance(rep.get());
   return QelBaseUnknown_var(rep.get());
 }
@@ -76,7 +75,7 @@ QelBaseUnknown_var QelModelBuilder::AddSet(const QelBaseUnknown_var& owner, cons
       return nullptr;
     }
   }
-  auto set = QelVar<QelLumAnnotationSet>::Adopt(new QelLumAnnotationSet(state_->model.get(), product, rep, desc));
+  auto set = QelMakeVar<QelLumAnnotationSet>(state_->model.get(), product, rep, desc);
   state_->model->AddSet(set.get());
   return QelBaseUnknown_var(set.get());
 }
@@ -85,7 +84,7 @@ QelBaseUnknown_var QelModelBuilder::AddAnnotation(const QelBaseUnknown_var& set,
   if (!state_->model) return nullptr;
   auto* owner = state_->Mine<QelLumAnnotationSet>(set.get());
   if (!owner) return nullptr;
-  auto annotation = QelVar<QelLumAnnotation>::Adopt(new QelLumAnnotation(owner, desc));
+  auto annotation = QelMakeVar<QelLumAnnotation>(owner, desc);
   owner->AddAnnotation(annotation.get());
   return QelBaseUnknown_var(annotation.get());
 }
@@ -103,8 +102,7 @@ QelBaseUnknown_var QelModelBuilder::AddView(const QelBaseUnknown_var& set, const
       if (!state_->Mine<QelLumView>(v)) return nullptr;
     }
   }
-  auto view = QelVar<QelLumView>::Adopt(
-      new QelLumView(owner, desc.alias, desc.icon, desc.plane, desc.extraction, desc.shown));
+  auto view = QelMakeVar<QelLumView>(owner, desc.alias, desc.icon, desc.plane, desc.extraction, desc.shown);
   for (QelBaseUnknown* e : desc.elements) view->AddElement(e);
   for (QelBaseUnknown* v : desc.referenceViews) view->AddReferenceView(v);
   for (QelBaseUnknown* v : desc.relatedViews) view->AddRelatedView(v);
@@ -127,8 +125,7 @@ QelBaseUnknown_var QelModelBuilder::AddCapture(const QelBaseUnknown_var& set, co
   if (desc.camera) {
     camera = QelVar<QelICamera>::Adopt(new QelLumCamera(desc.camera->origin, desc.camera->target, desc.camera->zenith));
   }
-  auto capture = QelVar<QelLumCapture>::Adopt(
-      new QelLumCapture(owner, desc.alias, desc.icon, desc.view, camera.get(), desc.shown));
+  auto capture = QelMakeVar<QelLumCapture>(owner, desc.alias, desc.icon, desc.view, camera.get(), desc.shown);
   owner->AddCapture(capture.get());
   return QelBaseUnknown_var(static_cast<QelILumCapture*>(capture.get()));
 }

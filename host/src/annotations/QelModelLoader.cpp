@@ -199,7 +199,7 @@ class Loader {
         QelModelRepInstanceDesc desc{.alias = OptString(r, "alias", at, ""),
                                      .referenceAlias = OptString(r, "reference", at, ""),
                                      .icon = OptString(r, "icon", at, "I_RepInstance")};
-        Declare(r, at, builder_.AddRepInstance(made, desc).get(), Kind::Rep);
+        Declare(r, at, builder_.AddRepInstance(QelBaseUnknown_var(made), desc).get(), Kind::Rep);
       }
     }
     if (auto it = p.find("children"); it != p.end()) {
@@ -215,7 +215,7 @@ class Loader {
         if (auto placement = c.find("placement"); placement != c.end()) {
           desc.placement = Placement(*placement, at.Key("placement"));
         }
-        QelBaseUnknown_var child = builder_.AddProduct(made, desc);
+        QelBaseUnknown_var child = builder_.AddProduct(QelBaseUnknown_var(made), desc);
         Product(c, at, child.get());
       }
     }
@@ -239,7 +239,7 @@ class Loader {
       else throw Refused(where.Key("rootSet"), "expected \"direct\" or \"arm\", found \"" + scope + "\"");
     }
     desc.shown = OptBool(s, "shown", where, true);
-    QelBaseUnknown_var set = builder_.AddSet(owner, desc);
+    QelBaseUnknown_var set = builder_.AddSet(QelBaseUnknown_var(owner), desc);
     if (!set) throw Refused(where.Key("rep"), "the rep instance does not belong to the owner");
     Declare(s, where, set.get(), Kind::Set);
     Each(s, "annotations", where, [&](const Json& a, const Where& at) { Annotation(set.get(), a, at); });
@@ -252,7 +252,7 @@ class Loader {
       for (size_t i = 0; i < list.size(); ++i) {
         others.push_back(AnyOf(list[i], at.At(static_cast<int>(i)), set.get()));
       }
-      builder_.SetOtherElements(set.get(), others);
+      builder_.SetOtherElements(set, others);
     }
   }
 
@@ -324,7 +324,7 @@ class Loader {
         desc.segments.push_back({Vector(segments[i][0], segAt.At(0)), Vector(segments[i][1], segAt.At(1))});
       }
     }
-    QelBaseUnknown_var made = builder_.AddAnnotation(set, desc);
+    QelBaseUnknown_var made = builder_.AddAnnotation(QelBaseUnknown_var(set), desc);
     setOf_[made.get()] = set;
     Declare(a, where, made.get(), Kind::Annotation);
   }
@@ -368,7 +368,7 @@ class Loader {
     desc.referenceViews = Refs(v, "references", where, Kind::View, "view", nullptr);
     desc.relatedViews = Refs(v, "related", where, Kind::View, "view", nullptr);
     desc.shown = OptBool(v, "shown", where, true);
-    QelBaseUnknown_var made = builder_.AddView(set, desc);
+    QelBaseUnknown_var made = builder_.AddView(QelBaseUnknown_var(set), desc);
     setOf_[made.get()] = set;
     Declare(v, where, made.get(), Kind::View);
   }
@@ -391,7 +391,7 @@ class Loader {
                                        Vector(Require(cam, "zenith", at), at.Key("zenith"))};
     }
     desc.shown = OptBool(c, "shown", where, true);
-    QelBaseUnknown_var made = builder_.AddCapture(set, desc);
+    QelBaseUnknown_var made = builder_.AddCapture(QelBaseUnknown_var(set), desc);
     setOf_[made.get()] = set;
     Declare(c, where, made.get(), Kind::Capture);
   }

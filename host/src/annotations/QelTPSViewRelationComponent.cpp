@@ -23,6 +23,6 @@ HRESULT QelTPSViewRelationComponent::GetRelatedObject(QelBaseUnknown* view, QelB
   auto* found = QelSysDynamicCast<QelLumView>(view);
   if (!found) return E_FAIL;
   if (!found->HasRelatedViews()) return S_FALSE;
-  related = static_cast<QelITPSViewGroup*>(found);
+  related = QelVar<QelBaseUnknown>(static_cast<QelITPSViewGroup*>(found));
   return S_OK;
 }

@@ -34,17 +34,27 @@ QelBaseUnknown::~QelBaseUnknown() {
     if (--weak_->refs == 0) delete weak_;
   }
   --g_liveObjects;
+  // Every derived destructor has run: what they added and released must balance. Less
+  // means a Release too many (a handle somewhere will release freed memory); more means
+  // somebody kept a reference to an object that is gone.
+  if (refs_ < kDestroying) QelAssertBool("release past zero");
+  else if (refs_ > kDestroying) QelAssertBool("reference kept on a destroyed object");
 }
 
 int64_t QelBaseUnknown::LiveObjectCount() { return g_liveObjects; }
 
-uint32_t QelBaseUnknown::AddRef() { return ++refs_; }
+uint32_t QelBaseUnknown::AddRef() {
+  // A second reference while the first has no owner: `QelVar<T> v(new T)` and the like,
+  // whose creation reference is never released.
+  if (refs_ == 1 && !firstReferenceOwned_) {
+    firstReferenceOwned_ = true;  // reported once
+    QelAssertBool("first reference not adopted");
+  }
+  return ++refs_;
+}
 
 uint32_t QelBaseUnknown::Release() {
-  if (refs_ == 0) {
-    QelAssertBool("release past zero");
-    return 0;
-  }
+  firstReferenceOwned_ = true;  // the creator gave its reference back
   if (--refs_ != 0) return refs_;
   refs_ = kDestroying;
   // Weak references die before the destructors run, so no upward link can reach a
@@ -95,7 +105,10 @@ QelBaseUnknown* QelBaseUnknown::FindOrCreateExtension(const QelMetaObject& exten
   for (const auto* entry : QelDictionary::Get().ExtensionsOf(GetLateType())) {
     if (entry->extension != &extension) continue;
     QelBaseUnknown* created = entry->creator(this);
-    if (created) extensions_->items.emplace_back(&extension, created);
+    if (created) {
+      created->NoteAdopted();  // the extended object owns it
+      extensions_->items.emplace_back(&extension, created);
+    }
     return created;
   }
   return nullptr;
@@ -115,6 +128,7 @@ HRESULT QelBaseUnknown::QueryInterface(const QelIID& iid, void** out) {
   auto answerWith = [&](QelFactory factory, QelBaseUnknown* impl) -> HRESULT {
     QelBaseUnknown* made = factory(impl);
     if (!made) return E_NOINTERFACE;
+    made->NoteAdopted();  // the reference is the caller's
     void* found = made->QueryDirect(iid);
     if (!found) {
       made->Release();

@@ -13,11 +13,14 @@ const QelMetaObject& QelApplicationFrame::MetaObject() {
 }
 
 QelApplicationFrame::QelApplicationFrame(const QelString& workbench)
-    : layout_(QelVar<QelFrmLayout>::Adopt(new QelFrmLayout)),
-      context_(QelVar<QelFrmContext>::Adopt(new QelFrmContext(workbench))) {}
+    : layout_(QelMakeVar<QelFrmLayout>()),
+      context_(QelMakeVar<QelFrmContext>(workbench)) {}
 
 QelApplicationFrame* QelApplicationFrame::CreateFrame(const QelString& workbench) {
-  if (!g_frame) g_frame = new QelApplicationFrame(workbench);
+  if (!g_frame) {
+    g_frame = new QelApplicationFrame(workbench);
+    g_frame->NoteAdopted();
+  }
   return g_frame;
 }
 

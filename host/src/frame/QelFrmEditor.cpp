@@ -13,8 +13,8 @@ const QelMetaObject& QelFrmEditor::MetaObject() {
 
 QelFrmEditor::QelFrmEditor(QelBaseUnknown* root)
     : root_(root),
-      cso_(QelVar<QelCSO>::Adopt(new QelCSO)),
-      uiActivePath_(QelVar<QelPathElement>::Adopt(new QelPathElement)) {}
+      cso_(QelMakeVar<QelCSO>()),
+      uiActivePath_(QelMakeVar<QelPathElement>()) {}
 
 QelFrmEditor* QelFrmEditor::GetCurrentEditor() {
   QelFrmLayout* layout = QelFrmLayout::GetCurrentLayout();
@@ -23,7 +23,7 @@ QelFrmEditor* QelFrmEditor::GetCurrentEditor() {
 }
 
 void QelFrmEditor::SetUIActivePath(QelPathElement* path) {
-  QelVar<QelPathElement> fresh = path ? path->Copy() : QelVar<QelPathElement>::Adopt(new QelPathElement);
+  QelVar<QelPathElement> fresh = path ? path->Copy() : QelMakeVar<QelPathElement>();
   if (fresh->IsSamePath(uiActivePath_.get())) return;
   uiActivePath_ = std::move(fresh);
   // The editor may lose its last outside reference inside a subscriber.

@@ -35,7 +35,7 @@ QelBaseUnknown_var QelPathElement::NextChildElement() {
 }
 
 QelVar<QelPathElement> QelPathElement::Copy() const {
-  auto copy = QelVar<QelPathElement>::Adopt(new QelPathElement);
+  auto copy = QelMakeVar<QelPathElement>();
   copy->elements_ = elements_;
   copy->cursor_ = cursor_;
   return copy;

@@ -73,7 +73,7 @@ HRESULT QelPLMProductOccurrence::AddObserver(QelBaseUnknown* observer) {
   // The callback list holds the observer weakly: one that goes away is skipped, never kept.
   QelBaseUnknown_WR weak(observer);
   callbacks.AddCallback(this, kLightLoadModeChanged, observer, [weak](QelBaseUnknown*, QelBaseUnknown*) {
-    if (QelVar<QelILumLightLoadModeObserver> told = weak.Get().get()) told->OnLightLoadModeChanged();
+    if (QelVar<QelILumLightLoadModeObserver> told{weak.Get().get()}) told->OnLightLoadModeChanged();
   });
   return S_OK;
 }

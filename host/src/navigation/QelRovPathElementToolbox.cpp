@@ -11,7 +11,7 @@ HRESULT QelRovPathElementToolbox::GetMechPartToContextTransfo(QelPathElement* pa
   QelMathTransformation toContext;
   bool contextFound = false;
   for (int i = 0; i < path->GetSize(); ++i) {
-    QelVar<QelIPLMNavOccurrence> occurrence = (*path)[i].get();
+    QelVar<QelIPLMNavOccurrence> occurrence((*path)[i].get());
     if (!occurrence) continue;
     // The context's own placement is in a frame above the path and takes no part.
     if (!contextFound) {

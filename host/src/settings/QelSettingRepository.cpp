@@ -202,7 +202,7 @@ HRESULT QelSettingRepository::State::Store(const char* key, json value, int sile
   }
   modified = true;
   if (!silent) {
-    auto notification = QelVar<QelSettingNotif>::Adopt(new QelSettingNotif(QelString(key)));
+    auto notification = QelMakeVar<QelSettingNotif>(QelString(key));
     QelCallbackManager::Get().Dispatch(self, kQelRepositoryModified, notification.get());
   }
   return S_OK;
@@ -266,6 +266,7 @@ QelSettingRepository* QelSettingRepository::GetRepository(const char* name, int 
     std::error_code ec;
     if (!create && !fs::exists(fs::path(dir) / (std::string(name) + ".json"), ec)) return nullptr;
     auto* repository = new QelSettingRepository(QelString(name), dir);
+    repository->NoteAdopted();  // the registry owns it
     registry.emplace(id, repository);
     return repository;
   } catch (const std::exception&) {
@@ -379,7 +380,7 @@ HRESULT QelSettingRepository::RemoveSetting(const char* key, int silent) {
   state_->values.erase(key);
   state_->modified = true;
   if (!silent) {
-    auto notification = QelVar<QelSettingNotif>::Adopt(new QelSettingNotif(QelString(key)));
+    auto notification = QelMakeVar<QelSettingNotif>(QelString(key));
     QelCallbackManager::Get().Dispatch(this, kQelRepositoryModified, notification.get());
   }
   return S_OK;
