@@ -27,21 +27,6 @@ bool ShownAfterEnable(QelBaseUnknown* annotation, QelRovFacetFilterData* filter)
 }
 }  // namespace
 
-TEST(QelRovFacetFilterDataTest, StartsWithoutValuesAndPresetOperators) {
-  auto filter = NewFilter();
-  QelPropertyOperator left = QelPropertyOperatorEqual, right = QelPropertyOperatorEqual;
-  double one = 1.0;
-  double* leftValue = &one;
-  double* rightValue = &one;
-  ASSERT_EQ(filter->GetToleranceValues(left, leftValue, right, rightValue), S_OK);
-  EXPECT_EQ(left, QelPropertyOperatorLessOrEqual);
-  EXPECT_EQ(right, QelPropertyOperatorLessOrEqual);
-  EXPECT_EQ(leftValue, nullptr);
-  EXPECT_EQ(rightValue, nullptr);
-  EXPECT_FALSE(filter->DefaultAnnot);
-  EXPECT_FALSE(filter->TolAnnot);
-}
-
 TEST(QelRovFacetFilterDataTest, CopiesValuesAndSurvivesWritingBackItsOwnPointers) {
   auto filter = NewFilter();
   double low = 0.1, high = 0.5;

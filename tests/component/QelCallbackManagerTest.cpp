@@ -1,8 +1,10 @@
 // Callback lists must survive additions and removals made by the callbacks themselves.
 #include <gtest/gtest.h>
 
+#include <stdexcept>
 #include <vector>
 
+#include "QelAssert.h"
 #include "QelCallbackManager.h"
 #include "TestObjects.h"
 
@@ -100,6 +102,33 @@ TEST_F(CallbackManagerTest, PayloadAndPublisherReachTheCallback) {
   });
   manager_.Dispatch(publisher_.get(), "N", payload.get());
   EXPECT_EQ(calls_, std::vector<std::string>{"I am publisher/I am payload"});
+}
+
+// A callback that throws ends the dispatch, not the bookkeeping: removals made afterwards
+// are compacted as usual instead of piling up for good.
+TEST_F(CallbackManagerTest, ThrowingCallbackLeavesTheListCompactable) {
+  manager_.AddCallback(publisher_.get(), "A", subscriber_.get(), [](auto*, auto*) { throw std::runtime_error("boom"); });
+  EXPECT_THROW(manager_.Dispatch(publisher_.get(), "A"), std::runtime_error);
+  const size_t stored = manager_.StoredEntries();
+  for (int i = 0; i < 100; ++i) {
+    QelCallbackId id = manager_.AddCallback(publisher_.get(), "B", subscriber_.get(), [](auto*, auto*) {});
+    manager_.RemoveCallback(id);
+  }
+  EXPECT_EQ(manager_.StoredEntries(), stored);
+}
+
+// The same function of the same subscriber for the same notification is one subscription;
+// a second one is a mistake (it would be called twice) and is reported.
+TEST_F(CallbackManagerTest, AddingTheSameCallbackTwiceIsReportedAndKeepsOne) {
+  QelAssertionCapture capture;
+  auto add = [&] { return manager_.AddCallback(publisher_.get(), "A", subscriber_.get(), [&](auto*, auto*) { calls_.push_back("a"); }); };
+  const QelCallbackId first = add();
+  EXPECT_EQ(add(), first);
+  EXPECT_EQ(capture.Count(kQelAssertKindBool, "callback added twice"), 1);
+  manager_.AddCallback(publisher_.get(), "A", publisher_.get(), [&](auto*, auto*) { calls_.push_back("p"); });
+  manager_.Dispatch(publisher_.get(), "A");
+  EXPECT_EQ(calls_, (std::vector<std::string>{"a", "p"}));
+  EXPECT_EQ(capture.Count(), 1);
 }
 
 }  // namespace

@@ -200,6 +200,26 @@ TEST_F(ComponentModelTest, AssigningAHandleFromWhatItHoldsKeepsTheSourceAlive) {
   EXPECT_EQ(self->value, 0);
 }
 
+// An entry overridden by a second module belongs to that module from then on: unloading
+// it must take the entry away, since its factory would point into a closed library.
+TEST_F(ComponentModelTest, OverridingEntriesMoveToTheOverridingFramework) {
+  QelDictionary& dictionary = QelDictionary::Get();
+  QelNamedCreator zoo = []() -> QelBaseUnknown* { return TestAnimal::Create("zoo").Detach(); };
+  QelExtensionCreator none = [](QelBaseUnknown*) -> QelBaseUnknown* { return nullptr; };
+  const QelMetaObject& extension =
+      QelMetaObject::Declare("TestOverriddenExtension", QelMetaKind::DataExtension, &QelBaseUnknown::MetaObject(), "First");
+  for (const char* framework : {"First", "Second"}) {
+    dictionary.Register("TestOverridden", ITestCounter::IID, &QelCreateTie<TieCounterOfAnimal>, framework);
+    dictionary.RegisterExtension("TestOverridden", extension, none, framework);
+    dictionary.RegisterNamedCreator("TestOverridden", zoo, framework);
+  }
+  dictionary.RemoveFramework("Second");
+  EXPECT_EQ(dictionary.FindFactory("TestOverridden", ITestCounter::IID), nullptr);
+  EXPECT_TRUE(dictionary.ExtensionsOf("TestOverridden").empty());
+  EXPECT_EQ(dictionary.FindNamedCreator("TestOverridden"), nullptr);
+  EXPECT_TRUE(dictionary.Describe("First").empty());
+}
+
 TEST_F(ComponentModelTest, NamedComponentIsInstantiatedWithTheRequestedInterface) {
   QelDictionary::Get().RegisterNamedCreator(
       "TestZoo", []() -> QelBaseUnknown* { return TestAnimal::Create("zoo").Detach(); }, "Tests");

@@ -32,6 +32,8 @@ TEST_F(ListTest, PositionsAreOneBasedAndOutOfRangeIsReported) {
   ASSERT_EQ(list.Size(), 2);
   EXPECT_EQ(list[1].get(), static_cast<QelBaseUnknown*>(a_.get()));
   EXPECT_EQ(list[2].get(), static_cast<QelBaseUnknown*>(b_.get()));
+  // Read only: an out-of-range answer is a shared null that nobody may write into.
+  static_assert(std::is_const_v<std::remove_reference_t<decltype(list[1])>>);
   QelAssertionCapture capture;
   EXPECT_FALSE(list[0]);
   EXPECT_FALSE(list[3]);

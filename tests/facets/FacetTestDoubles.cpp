@@ -40,10 +40,11 @@ namespace {
 class TieObserverTestFacet final : public QelTie<QelIRovFacetPropertyObserver> {
  public:
   using QelTie::QelTie;
+  // Through the base class, as a tie written for any facet would call it.
   HRESULT CanChangeCheckState(QelBaseUnknown* p, QelCheckState s) override {
-    return Impl<TestFacet>()->CanChangeCheckState(p, s);
+    return Impl<QelRovFacet>()->CanChangeCheckState(p, s);
   }
-  HRESULT OnPropertyChanged(QelBaseUnknown* p) override { return Impl<TestFacet>()->OnPropertyChanged(p); }
+  HRESULT OnPropertyChanged(QelBaseUnknown* p) override { return Impl<QelRovFacet>()->OnPropertyChanged(p); }
 
  private:
   ~TieObserverTestFacet() override = default;

@@ -59,12 +59,16 @@ class TestFacet : public QelRovFacet {
   void Name(const char* name) { SetFacetName(QelUnicodeString(name)); }
 
   void Refresh() override { ++refreshes; }
+  HRESULT CanChangeCheckState(QelBaseUnknown* property, QelCheckState state) override {
+    return veto == S_OK ? QelRovFacet::CanChangeCheckState(property, state) : veto;
+  }
   HRESULT ApplyPropertyChange(QelBaseUnknown* property) override {
     applied.push_back(property);
     return applyAnswer;
   }
 
   HRESULT applyAnswer = S_OK;
+  HRESULT veto = S_OK;  // what CanChangeCheckState answers when not S_OK
   int refreshes = 0;
   std::vector<QelBaseUnknown*> applied;
 

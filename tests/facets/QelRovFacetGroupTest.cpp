@@ -4,6 +4,8 @@
 
 #include "FacetTestDoubles.h"
 #include "QelAssert.h"
+#include "QelCSO.h"
+#include "QelCallbackManager.h"
 #include "QelFrmEditor.h"
 #include "QelILumLightLoadModeObserver.h"
 #include "QelModelBuilder.h"
@@ -54,7 +56,7 @@ TEST(QelRovFacetGroupRecord, RootAndFilterDataComeFromTheLiveGroupOnly) {
   EXPECT_EQ(capture.Count(kQelAssertKindPointer, kQelAssertNullHandler), 1);
 }
 
-TEST(QelRovFacetGroupRecord, SubscribesOnceToLightSetOwnersAndHearsTheirSwitch) {
+TEST(QelRovFacetGroupRecord, SubscribesOnceToEachLightSetOwner) {
   QelModelBuilder builder;
   QelBaseUnknown_var part = AddPart(builder);
   AddSet(builder, part.get(), "Light", true);
@@ -62,22 +64,38 @@ TEST(QelRovFacetGroupRecord, SubscribesOnceToLightSetOwnersAndHearsTheirSwitch) 
   QelBaseUnknown_var root = builder.Finish();
   auto editor = EditorOn(root.get());
   auto group = Make<TestFacetGroup>(editor.get());
+  const QelCallbackManager& callbacks = QelCallbackManager::Get();
 
+  group->AddLightLoadModeObservers();
   group->AddLightLoadModeObservers();
   ASSERT_EQ(group->GetObservables().Size(), 1);
-  group->AddLightLoadModeObservers();
-  EXPECT_EQ(group->GetObservables().Size(), 1);
-
-  // Without facets the group reports its rebuild cannot run: proof the switch arrived.
-  QelAssertionCapture capture;
-  QelModelBuilder::SwitchLightLoadMode(part, true);
-  EXPECT_EQ(capture.Count(kQelAssertKindPointer, "facet"), 1);
-  EXPECT_EQ(group->GetObservables().Size(), 1);
+  EXPECT_EQ(callbacks.CountCallbacks(part.get(), {}, group.get()), 1);
+  EXPECT_EQ(callbacks.CountCallbacks(root.get(), {}, group.get()), 0);  // no light set of its own
 
   group->RemoveLightLoadModeObservers();
   EXPECT_EQ(group->GetObservables().Size(), 0);
-  QelModelBuilder::SwitchLightLoadMode(part, false);
-  EXPECT_EQ(capture.Count(), 1);
+  EXPECT_EQ(callbacks.CountCallbacks(part.get(), {}, group.get()), 0);
+}
+
+// The group holds its editor weakly: it may outlive it, and its destructor then treats
+// the editor as absent. With the editor alive, the destructor takes back its selection
+// callbacks.
+TEST(QelRovFacetGroupRecord, DestructorRemovesSelectionCallbacksAndSurvivesItsEditor) {
+  QelAssertionCapture capture;
+  auto editor = EditorOn(nullptr);
+  QelCSO* selection = editor->GetCSO();
+  auto group = Make<TestFacetGroup>(editor.get());
+  const QelCallbackId id = QelCallbackManager::Get().AddCallback(selection, "QelCSOChangeNotification", group.get(),
+                                                                [](QelBaseUnknown*, QelBaseUnknown*) {});
+  group = nullptr;
+  EXPECT_FALSE(QelCallbackManager::Get().RemoveCallback(id)) << "the dead group's callback is still registered";
+  EXPECT_EQ(capture.Count(), 0);
+
+  auto orphan = Make<TestFacetGroup>(editor.get());
+  editor = nullptr;
+  EXPECT_EQ(orphan->GetEditor(), nullptr);
+  orphan = nullptr;
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer, "QelFrmEditor"), 1);
 }
 
 class QelRovFacetGroupDependents : public ::testing::Test {

@@ -125,21 +125,59 @@ TEST_F(QelRovFacetPropertyItems, AnnotationItemPrefersItsFirstNavigationName) {
   EXPECT_FALSE(Shown(datum.get()));
 }
 
-TEST_F(QelRovFacetPropertyItems, TypeItemStartsUncheckedAndAppliesEveryAnnotation) {
+TEST_F(QelRovFacetPropertyItems, TypeItemStartsUncheckedHasNoIconAndAppliesLastToFirst) {
   QelModelBuilder::SetShown(tols[1], true);
   auto item = Make<QelRovFacetPropertyItemTypeAnnot>(QelUnicodeString("Tol"), filter.get(), group.get());
   EXPECT_EQ(item->GetCheckState(), Unchecked);  // whatever the display shows
+  QelUnicodeString icon("x");
+  EXPECT_EQ(item->GetIconName(icon), E_NOTIMPL);
+  EXPECT_TRUE(icon.IsEmpty());
   for (auto& tol : tols) item->AddAnnotation(tol.get());
   EXPECT_EQ(item->CountItems(), 3);
+
+  std::vector<std::string> changed;
+  QelRovFacetServices::AddDisplayChangeCallback(root.get(), group.get(), [&](QelBaseUnknown*, QelBaseUnknown* object) {
+    QelUnicodeString alias;
+    QelVar<QelIAlias>(object)->GetAlias(alias);
+    changed.push_back(alias.Utf8());
+  });
   item->SetCheckState(Checked);
   EXPECT_EQ(item->ApplyCheckState(), S_OK);
-  for (auto& tol : tols) EXPECT_TRUE(Shown(tol.get()));
+  EXPECT_EQ(changed, (std::vector<std::string>{"T3", "T1"}));  // T2 was shown already
+  changed.clear();
   item->SetCheckState(Unchecked);
   EXPECT_EQ(item->ApplyCheckState(), S_OK);
-  for (auto& tol : tols) EXPECT_FALSE(Shown(tol.get()));
+  EXPECT_EQ(changed, (std::vector<std::string>{"T3", "T2", "T1"}));
   QelModelBuilder::SetShown(tols[0], true);
   EXPECT_EQ(item->RefreshCheckState(), S_OK);  // no object: state stays
   EXPECT_EQ(item->GetCheckState(), Unchecked);
+}
+
+// The filter data reaches the display request: with the default-annotation switch on, a
+// checked annotation that is not a default one stays hidden.
+TEST_F(QelRovFacetPropertyItems, AnnotationItemAppliesThroughTheFilterData) {
+  auto item = Make<QelRovFacetPropertyItemCustomAnnot>(tols[0].get(), filter.get(), group.get());
+  filter->DefaultAnnot = true;
+  item->SetCheckState(Checked);
+  EXPECT_EQ(item->ApplyCheckState(), S_OK);
+  EXPECT_FALSE(Shown(tols[0].get()));
+  filter->DefaultAnnot = false;
+  EXPECT_EQ(item->ApplyCheckState(), S_OK);
+  EXPECT_TRUE(Shown(tols[0].get()));
+}
+
+// An object the display layer does not know (no model) answers E_FAIL; that is no check
+// state, so the item keeps the one it had instead of storing a negative state.
+TEST_F(QelRovFacetPropertyItems, ObjectOfNoModelLeavesTheStateAsItWas) {
+  QelAssertionCapture capture;
+  auto stranger = Make<AliasOnly>("Stranger");
+  auto item = Make<QelRovFacetPropertyItemViewCapture>(stranger.get(), nullptr, nullptr, group.get());
+  EXPECT_EQ(item->GetCheckState(), Unchecked);
+  item->SetCheckState(Checked);
+  EXPECT_EQ(item->RefreshCheckState(), S_OK);
+  EXPECT_EQ(item->GetCheckState(), Checked);
+  auto annotation = Make<QelRovFacetPropertyItemCustomAnnot>(stranger.get(), filter.get(), group.get());
+  EXPECT_EQ(annotation->GetCheckState(), Unchecked);
 }
 
 TEST_F(QelRovFacetPropertyItems, ItemWhoseObjectIsGoneKeepsItsStateAndRefusesToApply) {

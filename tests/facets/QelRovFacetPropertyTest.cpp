@@ -33,6 +33,50 @@ TEST(QelRovFacetPropertySetCheck, VetoKeepsStateAndDisplayAndReturnsFail) {
   EXPECT_TRUE(observer->changed.empty());
 }
 
+// Clicks that change nothing: a radio choice is never unchecked by a click, and a
+// property whose owner is gone refuses without touching its state.
+TEST(QelRovFacetPropertySetCheck, RadioUncheckAndVanishedOwnerChangeNothing) {
+  QelAssertionCapture capture;
+  auto observer = Make<RecordingObserver>();
+  auto radio = Make<TestProperty>("radio", observer.get());
+  radio->SetFlags(QelRovFacetProperty::FlagsRadio);
+  radio->SetCheckState(Checked);
+  EXPECT_EQ(radio->SetCheck(false), S_FALSE);
+  EXPECT_EQ(radio->GetCheckState(), Checked);
+  EXPECT_TRUE(observer->asked.empty());
+
+  auto orphan = Make<TestProperty>("orphan", observer.get());
+  observer = nullptr;
+  EXPECT_EQ(orphan->SetCheck(true), E_UNEXPECTED);
+  EXPECT_EQ(orphan->GetCheckState(), Unchecked);
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer, kQelAssertNullHandler), 1);
+}
+
+// An owner may drop the property while it is asked (a modal question runs the host's loop,
+// where a rebuild can happen): the property must still be alive to answer.
+TEST(QelRovFacetPropertySetCheck, OwnerReleasingThePropertyWhileAskedIsSafe) {
+  class DroppingObserver : public RecordingObserver {
+   public:
+    HRESULT CanChangeCheckState(QelBaseUnknown* property, QelCheckState state) override {
+      held = nullptr;
+      return RecordingObserver::CanChangeCheckState(property, state);
+    }
+    QelVar<TestProperty> held;
+
+   protected:
+    ~DroppingObserver() override = default;
+  };
+  auto observer = Make<DroppingObserver>();
+  TestProperty* p = nullptr;
+  {
+    auto made = Make<TestProperty>("p", observer.get());
+    p = made.get();
+    observer->held = made;
+  }
+  EXPECT_EQ(p->SetCheck(true), S_OK);  // freed memory here without the early hold
+  EXPECT_EQ(observer->changed.size(), 1u);
+}
+
 TEST(QelRovFacetPropertySetCheck, PartiallyCheckedChangesOnEitherClick) {
   auto observer = Make<RecordingObserver>();
   for (bool click : {true, false}) {

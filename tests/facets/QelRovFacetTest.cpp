@@ -57,6 +57,17 @@ TEST_F(QelRovFacetChange, EntryThatIsNoPropertyIsReportedAndSkipped) {
   EXPECT_EQ(capture.Count(kQelAssertKindPointer), 1);
 }
 
+// A facet's veto holds whoever asks: the property reaches it through the observer tie,
+// which only knows the facet base class.
+TEST_F(QelRovFacetChange, FacetVetoReachesThroughTheBaseClass) {
+  facet->veto = S_FALSE;
+  EXPECT_EQ(radios[1]->SetCheck(true), E_FAIL);
+  EXPECT_EQ(radios[1]->GetCheckState(), Unchecked);
+  EXPECT_EQ(radios[0]->GetCheckState(), Checked);
+  EXPECT_TRUE(log.empty());
+  EXPECT_TRUE(facet->applied.empty());
+}
+
 TEST(QelRovFacetAccessors, FacetGroupResolvesOnlyToALiveFacetGroup) {
   QelAssertionCapture capture;
   auto observer = Make<RecordingObserver>();

@@ -10,21 +10,6 @@ namespace {
 
 using LayoutTest = FrameTest;
 
-TEST_F(LayoutTest, WindowKindsAnswerIsAKindOfThroughTheirMetaClasses) {
-  auto editor = NewEditor();
-  QelFrmWindow* w3d = AddWindow<Qel3DWindow>(editor.get());
-  QelFrmWindow* w2dl = AddWindow<Qel2DLWindow>(editor.get());
-  QelFrmWindow* wdft = AddWindow<QelDftWindow>(editor.get());
-  EXPECT_TRUE(w3d->IsAKindOf("Qel3DWindow"));
-  EXPECT_TRUE(w3d->IsAKindOf("QelFrmWindow"));
-  EXPECT_TRUE(w3d->IsAKindOf("QelBaseUnknown"));
-  EXPECT_FALSE(w3d->IsAKindOf("Qel2DLWindow"));
-  EXPECT_TRUE(w2dl->IsAKindOf("Qel2DLWindow"));
-  EXPECT_FALSE(w2dl->IsAKindOf("QelDftWindow"));
-  EXPECT_TRUE(wdft->IsAKindOf("QelDftWindow"));
-  EXPECT_STREQ(wdft->IsA(), "QelDftWindow");
-}
-
 TEST_F(LayoutTest, WindowListKeepsOrderAndFiltersByEditorAndKind) {
   auto first = NewEditor(), second = NewEditor();
   QelFrmWindow* a = AddWindow<Qel3DWindow>(first.get());
@@ -109,19 +94,6 @@ TEST_F(LayoutTest, RemovingTheCurrentWindowHandsOverToTheLastRemainingOne) {
   EXPECT_EQ(layout_->RemoveWindow(a), S_OK);
   EXPECT_EQ(layout_->GetCurrentWindow(), nullptr);
   EXPECT_EQ(QelFrmEditor::GetCurrentEditor(), nullptr);
-}
-
-TEST(FrameLifetimeTest, WithoutAFrameTheStaticLookupsAnswerNull) {
-  EXPECT_EQ(QelApplicationFrame::GetFrame(), nullptr);
-  EXPECT_EQ(QelFrmLayout::GetCurrentLayout(), nullptr);
-  EXPECT_EQ(QelFrmContext::GetContext(), nullptr);
-  EXPECT_EQ(QelFrmEditor::GetCurrentEditor(), nullptr);
-  QelApplicationFrame* frame = QelApplicationFrame::CreateFrame("TPSCfg");
-  EXPECT_EQ(QelApplicationFrame::CreateFrame("Other"), frame);
-  EXPECT_EQ(QelFrmContext::GetContext()->GetWorkbenchName(), QelString("TPSCfg"));
-  EXPECT_EQ(frame->GetDispatcher(), frame);
-  QelApplicationFrame::DestroyFrame();
-  EXPECT_EQ(QelApplicationFrame::GetFrame(), nullptr);
 }
 
 }  // namespace

@@ -32,9 +32,9 @@ class QelRovFacet : public virtual QelBaseUnknown {
   HRESULT SetExpandedFlag(bool expanded);
 
   // Observer operations, forwarded by each concrete facet's tie. Only the annotation set
-  // facet vetoes; it hides CanChangeCheckState with its own.
-  HRESULT CanChangeCheckState(QelBaseUnknown* property, QelCheckState newState);
-  HRESULT OnPropertyChanged(QelBaseUnknown* property);
+  // facet vetoes; it overrides CanChangeCheckState.
+  virtual HRESULT CanChangeCheckState(QelBaseUnknown* property, QelCheckState newState);
+  virtual HRESULT OnPropertyChanged(QelBaseUnknown* property);
 
  protected:
   explicit QelRovFacet(QelBaseUnknown* group);

@@ -27,7 +27,7 @@ const QelMetaObject& QelRovFacetGroup::MetaObject() {
 const QelMetaObject* QelRovFacetGroup::GetMetaObject() const { return &MetaObject(); }
 
 QelRovFacetGroup::QelRovFacetGroup(QelFrmEditor* editor) : editor_(editor) {
-  if (!editor_) QelAssertPointer("QelFrmEditor");
+  if (!editor) QelAssertPointer("QelFrmEditor");
 }
 
 QelRovFacetGroup::~QelRovFacetGroup() {
@@ -38,17 +38,20 @@ QelRovFacetGroup::~QelRovFacetGroup() {
   annotationSetFacet_ = nullptr;
   viewFacet_ = nullptr;
   annotationTypeFacet_ = nullptr;
-  QelBaseUnknown* selection = editor_ ? editor_->GetCSO() : nullptr;
+  QelFrmEditor* editor = GetEditor();
+  QelBaseUnknown* selection = editor ? editor->GetCSO() : nullptr;
   if (!selection) {
-    QelAssertPointer(editor_ ? "CSO" : "QelFrmEditor");
+    QelAssertPointer(editor ? "CSO" : "QelFrmEditor");
   } else {
     QelCallbackManager::Get().RemoveCallbacksOn(selection, this, kCSOChanged);
     csoSubscription_ = 0;
   }
-  editor_ = nullptr;
+  editor_.Reset();
   // No RemoveObserver here: observables hold their observers weakly and skip dead ones.
   observables_.RemoveAll();
 }
+
+QelFrmEditor* QelRovFacetGroup::GetEditor() const { return QelSysDynamicCast<QelFrmEditor>(editor_.GetRaw()); }
 
 void QelRovFacetGroup::SetFacets(QelRovFacet* annotationSet, QelRovFacet* view, QelRovFacet* annotationType,
                                  QelRovFacetFilterData* filterData) {
@@ -72,13 +75,13 @@ HRESULT QelRovFacetGroup::GetRootAndFilterData(const QelBaseUnknown_WR& group, Q
     return E_UNEXPECTED;
   }
   filterData = facetGroup->GetFilterData();
-  return QelRovFacetServices::GetRootPLMObject(facetGroup->editor_, root);
+  return QelRovFacetServices::GetRootPLMObject(facetGroup->GetEditor(), root);
 }
 
 void QelRovFacetGroup::AddLightLoadModeObservers() {
   if (observables_.Size() != 0) return;
   QelBaseUnknown_var root;
-  QelRovFacetServices::GetRootPLMObject(editor_, root);
+  QelRovFacetServices::GetRootPLMObject(GetEditor(), root);
   if (!root) return;
   QelBaseUnknown_var made;
   QelLumInstantiateComponentBase(kSetComponent, made);

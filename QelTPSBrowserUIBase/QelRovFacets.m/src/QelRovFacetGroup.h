@@ -1,6 +1,7 @@
 #pragma once
 // QelRovFacetGroup: everything the data filtering panel of one editor needs, starting
-// with its record: the editor (not owned), the facets and the filter data (owned), the
+// with its record: the editor (held weakly: a group may outlive it), the facets and the
+// filter data (owned), the
 // panel and its dialog, and the light-load-mode observables it subscribed to. It is the
 // observer of its facets, which hold it weakly, and of those observables.
 #include "QelBaseUnknown_WR.h"
@@ -22,7 +23,8 @@ class QelRovFacetGroup : public virtual QelBaseUnknown {
   // A null editor is reported; the group is still made.
   explicit QelRovFacetGroup(QelFrmEditor* editor);
 
-  QelFrmEditor* GetEditor() const { return editor_; }
+  // The editor without a reference; null once it is gone.
+  QelFrmEditor* GetEditor() const;
   // Null until the facets are created.
   QelRovFacetFilterData* GetFilterData() const { return filterData_.get(); }
 
@@ -52,7 +54,7 @@ class QelRovFacetGroup : public virtual QelBaseUnknown {
                  QelRovFacetFilterData* filterData);
 
  private:
-  QelFrmEditor* editor_ = nullptr;
+  QelBaseUnknown_WR editor_;
   QelVar<QelRovFacet> annotationSetFacet_;
   QelVar<QelRovFacet> viewFacet_;
   QelVar<QelRovFacet> annotationTypeFacet_;

@@ -61,12 +61,13 @@ HRESULT QelRovFacetProperty::SetCheck(bool checked) {
   if ((flags_ & FlagRadio) && newState == Unchecked) return S_FALSE;
   if (newState == checkState_) return S_FALSE;
 
+  // The owner may drop its last reference on us while it is asked (a modal question runs
+  // the host's loop) or while it reacts: stay alive until done.
+  QelBaseUnknown_var self = QelBaseUnknown_var::Retain(this);
   QelVar<QelIRovFacetPropertyObserver> owner = ResolveOwnerObserver();
   if (!owner) return E_UNEXPECTED;
   if (owner->CanChangeCheckState(this, newState) != S_OK) return E_FAIL;
 
-  // The owner may drop its last reference on us while it reacts; stay alive until done.
-  QelBaseUnknown_var self = QelBaseUnknown_var::Retain(this);
   checkState_ = newState;
   if (ApplyCheckState() != S_OK) QelAssertBool("ApplyCheckState");
   owner->OnPropertyChanged(this);

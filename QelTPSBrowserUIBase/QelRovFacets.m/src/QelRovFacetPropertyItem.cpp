@@ -26,8 +26,14 @@ QelRovFacetPropertyItem::~QelRovFacetPropertyItem() = default;
 HRESULT QelRovFacetPropertyItem::ApplyCheckState() { return S_OK; }
 
 HRESULT QelRovFacetPropertyItem::RefreshCheckState() {
-  if (QelBaseUnknown_var object = object_.Get()) SetCheckState(QelRovFacetServices::IsDisplayEnabled(object.get()));
+  if (QelBaseUnknown_var object = object_.Get()) ReadStateFromDisplay(object.get());
   return S_OK;
+}
+
+HRESULT QelRovFacetPropertyItem::ReadStateFromDisplay(QelBaseUnknown* object) {
+  const HRESULT shown = QelRovFacetServices::IsDisplayEnabled(object);
+  if (shown >= 0) SetCheckState(shown);
+  return shown;
 }
 
 int32_t QelRovFacetPropertyItem::CountItems() { return 1; }

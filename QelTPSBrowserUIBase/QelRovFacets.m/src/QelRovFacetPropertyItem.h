@@ -31,6 +31,10 @@ class QelRovFacetPropertyItem : public QelRovFacetProperty {
   ~QelRovFacetPropertyItem() override;
 
   void SetObject(QelBaseUnknown* object) { object_ = QelBaseUnknown_WR(object); }
+  // Stores what IsDisplayEnabled answers for `object` as the check state (S_OK is
+  // Checked, S_FALSE Unchecked); a failure (an object of no model) leaves the state as it
+  // was. Gives the answer.
+  HRESULT ReadStateFromDisplay(QelBaseUnknown* object);
   // Takes the icon from `source` through QelIIcon, prefixed; false (icon left empty)
   // when the source does not answer it.
   bool SetIconFrom(QelBaseUnknown* source);

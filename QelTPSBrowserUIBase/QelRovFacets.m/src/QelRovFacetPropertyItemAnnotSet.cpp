@@ -2,7 +2,6 @@
 
 #include "QelAssert.h"
 #include "QelIAlias.h"
-#include "QelRovFacetServices.h"
 
 const QelMetaObject& QelRovFacetPropertyItemAnnotSet::MetaObject() {
   static const QelMetaObject& meta =
@@ -19,9 +18,7 @@ QelRovFacetPropertyItemAnnotSet::QelRovFacetPropertyItemAnnotSet(QelBaseUnknown*
     : QelRovFacetPropertyItem(QelUnicodeString(), group), ownerObject_(ownerObject), references_(references) {
   SetObject(set);
   references_.RemoveDuplicates();
-  const HRESULT shown = QelRovFacetServices::IsDisplayEnabled(set);
-  if (shown > 1) QelAssertBool("IsDisplayEnabled");
-  SetCheckState(shown);
+  if (ReadStateFromDisplay(set) > 1) QelAssertBool("IsDisplayEnabled");
   QelBaseUnknown* iconSource = references_.Size() > 0 ? references_[1].get() : ownerObject;
   if (!SetIconFrom(iconSource)) QelAssertNullHandler();
 }

@@ -6,7 +6,6 @@
 #include "QelIAlias.h"
 #include "QelINavigateObject.h"
 #include "QelRovFacetFilterData.h"
-#include "QelRovFacetServices.h"
 
 const QelMetaObject& QelRovFacetPropertyItemCustomAnnot::MetaObject() {
   static const QelMetaObject& meta =
@@ -23,7 +22,7 @@ QelRovFacetPropertyItemCustomAnnot::QelRovFacetPropertyItemCustomAnnot(QelBaseUn
     : QelRovFacetPropertyItem(QelUnicodeString(), group),
       filterData_(QelVar<QelRovFacetFilterData>::Retain(filterData)) {
   SetObject(annotation);
-  SetCheckState(QelRovFacetServices::IsDisplayEnabled(annotation));
+  ReadStateFromDisplay(annotation);
   if (!filterData_) {
     QelAssertPointer();
     return;

@@ -2,7 +2,6 @@
 
 #include "QelAssert.h"
 #include "QelIAlias.h"
-#include "QelRovFacetServices.h"
 
 const QelMetaObject& QelRovFacetPropertyItemViewCapture::MetaObject() {
   static const QelMetaObject& meta =
@@ -18,7 +17,7 @@ QelRovFacetPropertyItemViewCapture::QelRovFacetPropertyItemViewCapture(QelBaseUn
                                                                        QelBaseUnknown* set, QelBaseUnknown* group)
     : QelRovFacetPropertyItem(QelUnicodeString(), group), ownerObject_(ownerObject), set_(set) {
   SetObject(viewOrCapture);
-  SetCheckState(QelRovFacetServices::IsDisplayEnabled(viewOrCapture));
+  ReadStateFromDisplay(viewOrCapture);
   if (!SetIconFrom(viewOrCapture)) QelAssertNullHandler();
 }
 

@@ -6,8 +6,13 @@
 //
 // The listing flags and how filter data applies to an annotation are stated in
 // docs/display-rule.md.
+#include "QelCallbackManager.h"
 #include "QelListValQelBaseUnknown_var.h"
 #include "QelVar.h"
+
+// Dispatched on a product model after an object of it was shown or hidden by a display
+// request; the payload is the object.
+inline constexpr const char* kQelDisplayChanged = "QelDisplayChanged";
 
 class QelFrmEditor;
 class QelPathElement;
@@ -40,6 +45,11 @@ class QelRovFacetServices {
   static HRESULT EnableDisableDisplay(QelBaseUnknown* object, int enable, QelRovFacetFilterData* filter);
   // S_OK shown, S_FALSE hidden; E_FAIL for an object of no model.
   static HRESULT IsDisplayEnabled(QelBaseUnknown* object);
+  // Subscribes `fn` to kQelDisplayChanged of the model that `objectOfModel` belongs to:
+  // it is called once per object whose shown state a display request changed. 0 for an
+  // object of no model.
+  static QelCallbackId AddDisplayChangeCallback(QelBaseUnknown* objectOfModel, QelBaseUnknown* subscriber,
+                                                QelCallbackFn fn);
 
   // The three mode answers of the sets component (62); (false, false, false) by default.
   static void SetLumSetModes(bool lightReviewMode, bool typeFilterAllowed, bool typeFilterForced);

@@ -24,6 +24,8 @@ class QelCallbackManager {
  public:
   static QelCallbackManager& Get();
 
+  // Adding the same function again for the same publisher, notification and subscriber is
+  // reported and answers the existing subscription.
   QelCallbackId AddCallback(QelBaseUnknown* publisher, std::string_view notification, QelBaseUnknown* subscriber,
                             QelCallbackFn fn);
   // True when the callback existed.
@@ -39,6 +41,9 @@ class QelCallbackManager {
   // subscriber, only that subscriber's.
   int CountCallbacks(QelBaseUnknown* publisher, std::string_view notification = {},
                      QelBaseUnknown* subscriber = nullptr) const;
+  // Entries held, removed ones included until they are compacted after the outermost
+  // dispatch: a diagnostics aid that shows the list does not grow without bound.
+  size_t StoredEntries() const { return entries_.size(); }
 
  private:
   QelCallbackManager() = default;
@@ -51,6 +56,7 @@ class QelCallbackManager {
     QelCallbackFn fn;
     bool removed = false;
   };
+  class DispatchScope;
   void Compact();
   std::vector<Entry> entries_;
   QelCallbackId nextId_ = 1;

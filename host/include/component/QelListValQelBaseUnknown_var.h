@@ -12,8 +12,8 @@ class QelListValQelBaseUnknown_var {
   void Append(QelBaseUnknown* object) { items_.emplace_back(QelBaseUnknown_var(object)); }
   void Append(const QelBaseUnknown_var& object) { items_.push_back(object); }
   void Append(const QelListValQelBaseUnknown_var& other);
-  // Position 1..Size(); anything else is a broken contract and gives a null handle.
-  QelBaseUnknown_var& operator[](int position);
+  // Position 1..Size(); anything else is a broken contract and gives a null handle. Read
+  // only: an out-of-range position must not hand out something a caller could write to.
   const QelBaseUnknown_var& operator[](int position) const;
   // 1-based position of the first entry equal to `object`, 0 when absent.
   int Locate(QelBaseUnknown* object) const;

@@ -24,6 +24,10 @@ class QelAnnotationModel : public QelBaseUnknown {
   const std::vector<QelVar<QelLumAnnotationSet>>& Sets() const { return sets_; }
   void AddSet(QelLumAnnotationSet* set);
   const std::string& SourceName() const { return sourceName_; }
+  // Set once somebody listens to the model's display changes, so that a display pass over
+  // a model nobody watches costs no dispatch.
+  bool IsDisplayWatched() const { return displayWatched_; }
+  void WatchDisplay() { displayWatched_ = true; }
   void SetSourceName(std::string name) { sourceName_ = std::move(name); }
 
  protected:
@@ -33,4 +37,5 @@ class QelAnnotationModel : public QelBaseUnknown {
   QelBaseUnknown_WR root_;
   std::vector<QelVar<QelLumAnnotationSet>> sets_;
   std::string sourceName_;
+  bool displayWatched_ = false;
 };

@@ -118,8 +118,20 @@ HRESULT QelRovFacetServices::EnableDisableDisplay(QelBaseUnknown* object, int en
   if (!target) return E_FAIL;
   if (enable != 0 && enable != 1) return E_FAIL;
   // The filter rule itself (docs/display-rule.md) lives with the annotation.
-  target->SetShown(enable == 1 && (!filter || target->PassesFilter(*filter)));
+  const bool shown = enable == 1 && (!filter || target->PassesFilter(*filter));
+  if (shown == target->IsShown()) return S_OK;
+  target->SetShown(shown);
+  QelAnnotationModel* model = QelAnnotationModel::Of(object);
+  if (model && model->IsDisplayWatched()) QelCallbackManager::Get().Dispatch(model, kQelDisplayChanged, object);
   return S_OK;
+}
+
+QelCallbackId QelRovFacetServices::AddDisplayChangeCallback(QelBaseUnknown* objectOfModel, QelBaseUnknown* subscriber,
+                                                            QelCallbackFn fn) {
+  QelAnnotationModel* model = QelAnnotationModel::Of(objectOfModel);
+  if (!model) return 0;
+  model->WatchDisplay();
+  return QelCallbackManager::Get().AddCallback(model, kQelDisplayChanged, subscriber, std::move(fn));
 }
 
 HRESULT QelRovFacetServices::IsDisplayEnabled(QelBaseUnknown* object) {

@@ -26,10 +26,7 @@ void QelAssertionFailed(const char* kind, const char* detail, const char* file, 
   const char* shortFile = BaseName(file ? file : "");
   std::string text = QelFormatAssertion(kind, detail, shortFile, line);
   if (QelCaptureReport({kind ? kind : "", detail ? detail : "", shortFile, line, text})) return;
-  if (QelDevelopmentStage()) {
-    std::fputs(text.c_str(), stderr);
-    QelSysLogAbend(text.c_str());
-  }
+  if (QelDevelopmentStage()) QelSysLogAbend(text.c_str());  // prints the text once, then aborts
   QelSysLogError(text.c_str());
 }
 

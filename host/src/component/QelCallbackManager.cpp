@@ -2,14 +2,54 @@
 
 #include <algorithm>
 
+#include "QelAssert.h"
+
 QelCallbackManager& QelCallbackManager::Get() {
   static auto* manager = new QelCallbackManager;  // lives until the process ends
   return *manager;
 }
 
+namespace {
+// Two callables are the same function when they have the same type and, for plain
+// function pointers, the same target. Each lambda expression has a type of its own, so a
+// lambda written once and registered twice by one subscriber counts as the same function.
+bool SameFunction(const QelCallbackFn& a, const QelCallbackFn& b) {
+  if (a.target_type() != b.target_type()) return false;
+  using Plain = void (*)(QelBaseUnknown*, QelBaseUnknown*);
+  const Plain* pa = a.target<Plain>();
+  const Plain* pb = b.target<Plain>();
+  return !pa || !pb || *pa == *pb;
+}
+}  // namespace
+
+// Counts a dispatch in progress for as long as it runs, however it ends: a callback that
+// throws must not leave the manager believing it is still iterating, or removed entries
+// would never be compacted again.
+class QelCallbackManager::DispatchScope {
+ public:
+  explicit DispatchScope(QelCallbackManager& manager) : manager_(manager) { ++manager_.dispatchDepth_; }
+  ~DispatchScope() {
+    --manager_.dispatchDepth_;
+    manager_.Compact();
+  }
+  DispatchScope(const DispatchScope&) = delete;
+  DispatchScope& operator=(const DispatchScope&) = delete;
+
+ private:
+  QelCallbackManager& manager_;
+};
+
 QelCallbackId QelCallbackManager::AddCallback(QelBaseUnknown* publisher, std::string_view notification,
                                               QelBaseUnknown* subscriber, QelCallbackFn fn) {
   if (!publisher || !fn) return 0;
+  for (const auto& entry : entries_) {
+    if (entry.removed || entry.notification != notification || !entry.publisher.RefersTo(publisher)) continue;
+    if (subscriber ? !entry.subscriber.RefersTo(subscriber) : entry.hasSubscriber) continue;
+    if (!SameFunction(entry.fn, fn)) continue;
+    // Called twice per notification would be the surprise; keep the first subscription.
+    QelAssertBool("callback added twice");
+    return entry.id;
+  }
   QelCallbackId id = nextId_++;
   entries_.push_back({id, QelBaseUnknown_WR(publisher), std::string(notification), QelBaseUnknown_WR(subscriber),
                       subscriber != nullptr, std::move(fn)});
@@ -49,7 +89,7 @@ void QelCallbackManager::Dispatch(QelBaseUnknown* publisher, std::string_view no
   QelBaseUnknown* publisherImpl = publisher->GetImpl();
   // Keeps the publisher and payload alive for the whole dispatch.
   QelBaseUnknown_var holdPublisher(publisher), holdPayload(payload);
-  ++dispatchDepth_;
+  DispatchScope scope(*this);
   // Only the callbacks present now take part; entries_ may grow meanwhile, so walk by index.
   const size_t count = entries_.size();
   for (size_t i = 0; i < count && i < entries_.size(); ++i) {
@@ -64,8 +104,6 @@ void QelCallbackManager::Dispatch(QelBaseUnknown* publisher, std::string_view no
     QelCallbackFn fn = entries_[i].fn;  // a copy: the entry may be removed by the call
     fn(publisher, payload);
   }
-  --dispatchDepth_;
-  Compact();
 }
 
 int QelCallbackManager::CountCallbacks(QelBaseUnknown* publisher, std::string_view notification,

@@ -15,7 +15,7 @@ void QelDictionary::Register(std::string_view classOrLateType, const QelIID& iid
   for (auto& entry : factories_) {
     if (entry.key == classOrLateType && entry.iid == iid) {  // a later registration wins
       entry.factory = factory;
-      entry.framework = framework;
+      entry.framework = framework;  // the entry now points into the overriding module
       return;
     }
   }
@@ -27,6 +27,7 @@ void QelDictionary::RegisterExtension(std::string_view lateType, const QelMetaOb
   for (auto& entry : extensions_) {
     if (entry.lateType == lateType && entry.extension == &extension) {
       entry.creator = creator;
+      entry.framework = framework;  // the entry now points into the overriding module
       return;
     }
   }
@@ -37,6 +38,7 @@ void QelDictionary::RegisterNamedCreator(std::string_view name, QelNamedCreator 
   for (auto& entry : named_) {
     if (entry.name == name) {
       entry.creator = creator;
+      entry.framework = framework;  // the entry now points into the overriding module
       return;
     }
   }

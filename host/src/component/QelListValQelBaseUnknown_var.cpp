@@ -15,18 +15,13 @@ void QelListValQelBaseUnknown_var::Append(const QelListValQelBaseUnknown_var& ot
   items_.insert(items_.end(), other.items_.begin(), other.items_.end());
 }
 
-QelBaseUnknown_var& QelListValQelBaseUnknown_var::operator[](int position) {
+const QelBaseUnknown_var& QelListValQelBaseUnknown_var::operator[](int position) const {
   if (position < 1 || position > Size()) {
     QelAssertBool("list position out of range");
-    static QelBaseUnknown_var none;
-    none = nullptr;
+    static const QelBaseUnknown_var none;
     return none;
   }
   return items_[position - 1];
-}
-
-const QelBaseUnknown_var& QelListValQelBaseUnknown_var::operator[](int position) const {
-  return const_cast<QelListValQelBaseUnknown_var&>(*this)[position];
 }
 
 int QelListValQelBaseUnknown_var::Locate(QelBaseUnknown* object) const {
