@@ -198,7 +198,8 @@ TEST(QelModelLoaderTest, ListsLoadWhateverTheOrderOfKeys) {
   // the annotations they name.
   const std::string text = R"({"sets": [{"captures": [{"view": "v1", "id": "c1"}],
       "views": [{"elements": ["a1", "a2"], "id": "v1"}],
-      "annotations": [{"code": 3, "subType": "S", "type": "T", "id": "a1"}, {"id": "a2", "type": "T", "subType": "S", "code": 5}],
+      "annotations": [{"code": 3, "subType": "S", "type": "T", "id": "a1"},
+                      {"id": "a2", "type": "T", "subType": "S", "code": 5}],
       "owner": "p1", "id": "s1"}],
     "root": {"children": [{"id": "p1"}], "id": "root"}, "version": 1, "format": "qel-product-model"})";
   QelBaseUnknown_var root;

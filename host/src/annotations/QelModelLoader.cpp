@@ -9,7 +9,6 @@
 #include <cstdint>
 #include <cstdio>
 #include <initializer_list>
-#include <iterator>
 #include <limits>
 #include <new>
 #include <stdexcept>
@@ -20,16 +19,12 @@
 #include <nlohmann/json.hpp>
 
 #include "QelModelBuilder.h"
+#include "QelModelJsonReader.h"
 #include "QelTPSTypeClassifier.h"
 
 namespace {
 using Json = nlohmann::json;
 
-// Containers inside containers, the document itself being level 1. The reader and the
-// loader walk the tree recursively in places, so the stack bounds what a file may nest.
-constexpr size_t kMaxNesting = 512;
-// Products below the root; each takes two levels of nesting (children array and object).
-constexpr int kMaxProductDepth = 200;
 // Larger files are refused before anything is read (docs/model-format.md).
 constexpr uint64_t kMaxFileBytes = uint64_t{1} << 30;
 
@@ -51,7 +46,6 @@ struct Where {
 
 struct Refused : std::runtime_error {
   Refused(const Where& where, const std::string& what) : std::runtime_error(where.Text() + ": " + what) {}
-  Refused(const std::string& path, const std::string& what) : std::runtime_error(path + ": " + what) {}
 };
 
 const char* TypeName(const Json& j) { return j.type_name(); }
@@ -149,208 +143,9 @@ QelMathTransformation Placement(const Json& j, const Where& where) {
   return t;
 }
 
-// Hands the text to the parser one character at a time and leaves the position where the
-// reader can see it: the parser reports no offsets, and the reader needs them to find an
-// element of a set's lists again.
-class TrackedChars {
- public:
-  using iterator_category = std::input_iterator_tag;
-  using value_type = char;
-  using difference_type = std::ptrdiff_t;
-  using pointer = const char*;
-  using reference = const char&;
-
-  TrackedChars(const char* at, const char** seen) : at_(at), seen_(seen) {}
-  reference operator*() const { return *at_; }
-  TrackedChars& operator++() {
-    *seen_ = ++at_;
-    return *this;
-  }
-  TrackedChars operator++(int) {
-    TrackedChars before = *this;
-    ++*this;
-    return before;
-  }
-  bool operator==(const TrackedChars& other) const { return at_ == other.at_; }
-  bool operator!=(const TrackedChars& other) const { return at_ != other.at_; }
-
- private:
-  const char* at_;
-  const char** seen_;
-};
-
-// The elements of one set's annotations, views and captures, as byte ranges of the text.
-struct SetLists {
-  struct Range {
-    size_t begin;
-    size_t end;
-  };
-  static constexpr const char* kKeys[] = {"annotations", "views", "captures"};
-  std::vector<Range> lists[3];
-};
-
-// Reads the document once (the parser's SAX events) and builds a tree of everything but
-// the elements of each set's annotations, views and captures: those are only located, and
-// the loader parses them one at a time, so the document never sits in memory as a whole
-// tree (that tree is many times the text). It also bounds the nesting and names the place
-// of numbers the parser cannot represent.
-class Reader {
- public:
-  Reader(const std::string& text, Json& doc, std::vector<SetLists>& sets) : text_(text), doc_(doc), sets_(sets) {}
-
-  void Read() {
-    const char* begin = text_.data();
-    const char* end = begin + text_.size();
-    seen_ = begin;
-    Json::sax_parse(TrackedChars(begin, &seen_), TrackedChars(end, &seen_), this);
-  }
-
-  bool null() { return Scalar(nullptr, "null"); }
-  bool boolean(bool value) { return Scalar(value, "boolean"); }
-  bool number_integer(Json::number_integer_t value) { return Scalar(value, "number"); }
-  bool number_unsigned(Json::number_unsigned_t value) { return Scalar(value, "number"); }
-  bool number_float(Json::number_float_t value, const std::string&) { return Scalar(value, "number"); }
-  bool string(std::string& value) { return Scalar(std::move(value), "string"); }
-  bool binary(Json::binary_t&) { return Scalar(nullptr, "binary"); }
-
-  bool start_object(size_t) {
-    Frame frame = Open("object");
-    if (!frame.value && frames_.size() == 4 && ListOfParent() >= 0) {
-      // The first character of an element of a set's list; the parser has just read it.
-      divertedAt_ = static_cast<size_t>(seen_ - text_.data()) - 1;
-      if (text_[divertedAt_] != '{') throw std::logic_error("the reader lost its place in the text");
-    }
-    frame.product = ProductDepth();
-    frames_.push_back(std::move(frame));
-    return true;
-  }
-
-  bool key(std::string& key) {
-    frames_.back().key = key;
-    return true;
-  }
-
-  bool end_object() {
-    if (frames_.size() == 5 && frames_[3].list >= 0) {
-      const Frame& list = frames_[3];
-      sets_[list.set].lists[list.list].push_back({divertedAt_, static_cast<size_t>(seen_ - text_.data())});
-    }
-    Close();
-    return true;
-  }
-
-  bool start_array(size_t) {
-    Frame frame = Open("array");
-    frame.array = true;
-    if (frames_.size() == 1 && !frames_[0].array && frames_[0].key == "sets") sets_.clear();
-    if (frame.value && frames_.size() == 3 && frames_[0].key == "sets" && frames_[1].array && !frames_[2].array) {
-      for (int k = 0; k < 3; ++k) {
-        if (frames_[2].key != SetLists::kKeys[k]) continue;
-        frame.list = k;
-        frame.set = frames_[1].next;
-        if (sets_.size() <= frame.set) sets_.resize(frame.set + 1);
-        sets_[frame.set].lists[k].clear();
-      }
-    }
-    frames_.push_back(std::move(frame));
-    return true;
-  }
-
-  bool end_array() {
-    Close();
-    return true;
-  }
-
-  bool parse_error(size_t, const std::string& token, const nlohmann::detail::exception& e) {
-    if (e.id == 406) throw Refused(Path(), "number out of range: " + token);
-    if (auto* syntax = dynamic_cast<const Json::parse_error*>(&e)) throw *syntax;
-    throw std::runtime_error(e.what());
-  }
-
- private:
-  struct Frame {
-    Json* value = nullptr;  // null inside an element of a set's list
-    bool array = false;
-    size_t next = 0;        // arrays: index of the element being read
-    std::string key;        // objects: key of the value being read
-    int product = -1;       // objects: depth of a product below the root
-    int list = -1;          // a set's list: which one, and of which set
-    size_t set = 0;
-  };
-
-  // The place of the value being read, as the loader's messages write it.
-  std::string Path() const {
-    std::string path = "$";
-    for (const Frame& f : frames_) path += f.array ? "[" + std::to_string(f.next) + "]" : "." + f.key;
-    return path;
-  }
-
-  int ListOfParent() const { return frames_.back().array ? frames_.back().list : -1; }
-
-  // Where the next value goes: the document, an array or an object's current key; null
-  // inside an element of a set's list, which is read again later on its own.
-  Json* Slot() {
-    if (frames_.empty()) return &doc_;
-    Frame& top = frames_.back();
-    if (!top.value) return nullptr;
-    if (top.array) return &top.value->get_ref<Json::array_t&>().emplace_back();
-    return &(*top.value)[top.key];
-  }
-
-  template <class Value>
-  bool Scalar(Value&& value, const char* type) {
-    if (!frames_.empty() && ListOfParent() >= 0) throw Refused(Path(), std::string("expected an object, found ") + type);
-    if (Json* slot = Slot()) *slot = Json(std::forward<Value>(value));
-    if (!frames_.empty() && frames_.back().array) ++frames_.back().next;
-    return true;
-  }
-
-  Frame Open(const char* type) {
-    if (frames_.size() >= kMaxNesting) {
-      throw Refused(Path(), "nested more than " + std::to_string(kMaxNesting) + " levels deep");
-    }
-    if (!frames_.empty() && std::string_view(type) == "array" && ListOfParent() >= 0) {
-      throw Refused(Path(), "expected an object, found array");
-    }
-    Frame frame;
-    const bool diverted = !frames_.empty() && ListOfParent() >= 0;
-    if (!diverted) {
-      if (Json* slot = Slot()) {
-        *slot = std::string_view(type) == "array" ? Json::array() : Json::object();
-        frame.value = slot;
-      }
-    }
-    return frame;
-  }
-
-  // A product is the value of the document's "root", or an element of a product's "children".
-  int ProductDepth() const {
-    if (frames_.size() == 1) return !frames_[0].array && frames_[0].key == "root" ? 0 : -1;
-    if (frames_.size() < 3 || !frames_.back().array) return -1;
-    const Frame& father = frames_[frames_.size() - 2];
-    if (father.product < 0 || father.key != "children") return -1;
-    if (father.product + 1 > kMaxProductDepth) {
-      throw Refused(Path(), "products nested more than " + std::to_string(kMaxProductDepth) + " levels deep");
-    }
-    return father.product + 1;
-  }
-
-  void Close() {
-    frames_.pop_back();
-    if (!frames_.empty() && frames_.back().array) ++frames_.back().next;
-  }
-
-  const std::string& text_;
-  Json& doc_;
-  std::vector<SetLists>& sets_;
-  std::vector<Frame> frames_;
-  const char* seen_ = nullptr;
-  size_t divertedAt_ = 0;
-};
-
 class Loader {
  public:
-  Loader(QelModelBuilder& builder, const std::string& text, const std::vector<SetLists>& lists)
+  Loader(QelModelBuilder& builder, const std::string& text, const std::vector<QelModelJsonReader::SetLists>& lists)
       : builder_(builder), text_(text), lists_(lists) {}
 
   // The root's own attributes, read before the builder exists.
@@ -457,7 +252,8 @@ class Loader {
     CheckKeys(s, where, {"id", "alias", "icon", "owner", "rep", "light", "kind", "rootSet", "shown", "annotations",
                          "views", "captures", "otherElements"});
     QelModelSetDesc desc{.alias = OptString(s, "alias", where, ""), .icon = OptString(s, "icon", where, "I_AnnotationSet")};
-    QelBaseUnknown* owner = Lookup(Require(s, "owner", where), where.Key("owner"), Kind::Product, "product").object.get();
+    QelBaseUnknown* owner =
+        Lookup(Require(s, "owner", where), where.Key("owner"), Kind::Product, "product").object.get();
     if (auto it = s.find("rep"); it != s.end()) {
       desc.rep = Lookup(*it, where.Key("rep"), Kind::Rep, "rep instance").object.get();
     }
@@ -503,13 +299,13 @@ class Loader {
   // each is parsed, loaded and dropped before the next.
   template <class Fn>
   void Each(const Json& s, size_t index, int list, const Where& where, Fn fn) {
-    const char* key = SetLists::kKeys[list];
+    const char* key = QelModelJsonReader::kListKeys[list];
     auto it = s.find(key);
     if (it == s.end()) return;
     Where listAt = where.Key(key);
     Array(*it, listAt);
     if (index >= lists_.size()) return;
-    const std::vector<SetLists::Range>& ranges = lists_[index].lists[list];
+    const std::vector<QelModelJsonReader::Range>& ranges = lists_[index].lists[list];
     for (size_t i = 0; i < ranges.size(); ++i) {
       Where at = listAt.At(static_cast<int>(i));
       const Json element = Json::parse(text_.data() + ranges[i].begin, text_.data() + ranges[i].end);
@@ -630,7 +426,7 @@ class Loader {
 
   QelModelBuilder& builder_;
   const std::string& text_;
-  const std::vector<SetLists>& lists_;
+  const std::vector<QelModelJsonReader::SetLists>& lists_;
   std::unordered_map<std::string, Entry> ids_;
 };
 
@@ -671,9 +467,9 @@ HRESULT QelModelLoader::LoadText(const std::string& text, const std::string& sou
   error.clear();
   try {
     Json doc;
-    std::vector<SetLists> lists;
+    std::vector<QelModelJsonReader::SetLists> lists;
     try {
-      Reader(text, doc, lists).Read();
+      QelModelJsonReader::Read(text, doc, lists);
     } catch (const Json::parse_error& e) {
       // The parser's own text starts with its exception name; keep only the explanation.
       std::string what = e.what();
