@@ -130,7 +130,7 @@ QelMathTransformation Placement(const Json& j, const Where& where) {
     if (it == p.end()) return fallback;
     Where at = where.Key(key);
     QelMathVector v = Vector(*it, at);
-    // Out-of-range literals parse as infinities; they would poison every point placed below.
+    // The reader already refuses literals beyond a double; an infinite axis would poison every point below.
     if (!std::isfinite(v.x) || !std::isfinite(v.y) || !std::isfinite(v.z)) throw Refused(at, "expected finite numbers");
     return v;
   };
