@@ -10,7 +10,8 @@ class QelModelLoader {
  public:
   QelModelLoader() = delete;
 
-  // S_OK and the root product; E_FAIL, a null root and the message otherwise.
+  // S_OK and the root product; E_FAIL, a null root and the message otherwise. Only a
+  // regular file of at most 1 GiB is read; no exception leaves either call.
   static HRESULT LoadFile(const std::string& path, QelBaseUnknown_var& root, std::string& error);
   // `sourceName` names the text in messages.
   static HRESULT LoadText(const std::string& text, const std::string& sourceName, QelBaseUnknown_var& root,

@@ -1,22 +1,32 @@
 #include "QelModelLoader.h"
 
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
 #include <cmath>
+#include <cstdint>
 #include <cstdio>
-#include <filesystem>
-#include <fstream>
 #include <initializer_list>
-#include <sstream>
+#include <limits>
+#include <new>
 #include <stdexcept>
 #include <string_view>
 #include <unordered_map>
+#include <vector>
 
 #include <nlohmann/json.hpp>
 
 #include "QelModelBuilder.h"
+#include "QelModelJsonReader.h"
 #include "QelTPSTypeClassifier.h"
 
 namespace {
 using Json = nlohmann::json;
+
+// Larger files are refused before anything is read (docs/model-format.md).
+constexpr uint64_t kMaxFileBytes = uint64_t{1} << 30;
 
 // A position in the document, formatted only when something is wrong.
 struct Where {
@@ -79,9 +89,21 @@ double Number(const Json& j, const Where& where) {
   return j.get<double>();
 }
 
-int Integer(const Json& j, const Where& where) {
+// Read wide, so that a value beyond the range of int is refused instead of wrapped.
+int64_t Integer(const Json& j, const Where& where) {
   if (!j.is_number_integer()) throw Refused(where, std::string("expected an integer, found ") + TypeName(j));
-  return j.get<int>();
+  if (j.is_number_unsigned() && j.get<uint64_t>() > uint64_t(std::numeric_limits<int64_t>::max())) {
+    throw Refused(where, "integer out of range: " + j.dump());
+  }
+  return j.get<int64_t>();
+}
+
+int SmallInteger(const Json& j, const Where& where) {
+  const int64_t value = Integer(j, where);
+  if (value < std::numeric_limits<int>::min() || value > std::numeric_limits<int>::max()) {
+    throw Refused(where, "integer out of range: " + std::to_string(value));
+  }
+  return static_cast<int>(value);
 }
 
 QelMathVector Vector(const Json& j, const Where& where) {
@@ -108,7 +130,7 @@ QelMathTransformation Placement(const Json& j, const Where& where) {
     if (it == p.end()) return fallback;
     Where at = where.Key(key);
     QelMathVector v = Vector(*it, at);
-    // Out-of-range literals parse as infinities; they would poison every point placed below.
+    // The reader already refuses literals beyond a double; an infinite axis would poison every point below.
     if (!std::isfinite(v.x) || !std::isfinite(v.y) || !std::isfinite(v.z)) throw Refused(at, "expected finite numbers");
     return v;
   };
@@ -123,7 +145,8 @@ QelMathTransformation Placement(const Json& j, const Where& where) {
 
 class Loader {
  public:
-  explicit Loader(QelModelBuilder& builder) : builder_(builder) {}
+  Loader(QelModelBuilder& builder, const std::string& text, const std::vector<QelModelJsonReader::SetLists>& lists)
+      : builder_(builder), text_(text), lists_(lists) {}
 
   // The root's own attributes, read before the builder exists.
   static QelModelProductDesc RootDesc(const Json& doc) {
@@ -159,31 +182,34 @@ class Loader {
     if (it == doc.end()) return;
     Where setsAt = top.Key("sets");
     const Json& sets = Array(*it, setsAt);
-    for (size_t i = 0; i < sets.size(); ++i) Set(sets[i], setsAt.At(static_cast<int>(i)));
+    for (size_t i = 0; i < sets.size(); ++i) Set(sets[i], setsAt.At(static_cast<int>(i)), i);
   }
 
  private:
   enum class Kind { Product, Rep, Set, Annotation, View, Capture };
+  // One per identifier of the file, so kept small: the set of a set's member, to check
+  // references that must stay within one set.
   struct Entry {
     QelBaseUnknown_var object;
+    QelBaseUnknown* set;
     Kind kind;
   };
 
-  void Declare(const Json& object, const Where& where, QelBaseUnknown* made, Kind kind) {
+  void Declare(const Json& object, const Where& where, QelBaseUnknown* made, Kind kind, QelBaseUnknown* set = nullptr) {
     Where idAt = where.Key("id");
     std::string id = String(Require(object, "id", where), idAt);
     if (id.empty()) throw Refused(idAt, "empty identifier");
-    if (!ids_.emplace(id, Entry{QelBaseUnknown_var(made), kind}).second) {
-      throw Refused(idAt, "duplicate identifier '" + id + "'");
+    if (!ids_.emplace(std::move(id), Entry{QelBaseUnknown_var(made), set, kind}).second) {
+      throw Refused(idAt, "duplicate identifier '" + object.at("id").get<std::string>() + "'");
     }
   }
 
-  QelBaseUnknown* Lookup(const Json& ref, const Where& where, Kind kind, const char* what) {
+  const Entry& Lookup(const Json& ref, const Where& where, Kind kind, const char* what) {
     std::string id = String(ref, where);
     auto it = ids_.find(id);
     if (it == ids_.end()) throw Refused(where, std::string("unknown ") + what + " '" + id + "'");
     if (it->second.kind != kind) throw Refused(where, "'" + id + "' is not a " + what);
-    return it->second.object.get();
+    return it->second;
   }
 
   void Product(const Json& p, const Where& where, QelBaseUnknown* made) {
@@ -221,17 +247,18 @@ class Loader {
     }
   }
 
-  void Set(const Json& j, const Where& where) {
+  void Set(const Json& j, const Where& where, size_t index) {
     const Json& s = Object(j, where);
     CheckKeys(s, where, {"id", "alias", "icon", "owner", "rep", "light", "kind", "rootSet", "shown", "annotations",
                          "views", "captures", "otherElements"});
     QelModelSetDesc desc{.alias = OptString(s, "alias", where, ""), .icon = OptString(s, "icon", where, "I_AnnotationSet")};
-    QelBaseUnknown* owner = Lookup(Require(s, "owner", where), where.Key("owner"), Kind::Product, "product");
+    QelBaseUnknown* owner =
+        Lookup(Require(s, "owner", where), where.Key("owner"), Kind::Product, "product").object.get();
     if (auto it = s.find("rep"); it != s.end()) {
-      desc.rep = Lookup(*it, where.Key("rep"), Kind::Rep, "rep instance");
+      desc.rep = Lookup(*it, where.Key("rep"), Kind::Rep, "rep instance").object.get();
     }
     desc.light = OptBool(s, "light", where, false);
-    if (auto it = s.find("kind"); it != s.end()) desc.kind = Integer(*it, where.Key("kind"));
+    if (auto it = s.find("kind"); it != s.end()) desc.kind = SmallInteger(*it, where.Key("kind"));
     if (auto it = s.find("rootSet"); it != s.end()) {
       std::string scope = String(*it, where.Key("rootSet"));
       if (scope == "direct") desc.rootScope = QelRootSetScope::Direct;
@@ -242,9 +269,9 @@ class Loader {
     QelBaseUnknown_var set = builder_.AddSet(QelBaseUnknown_var(owner), desc);
     if (!set) throw Refused(where.Key("rep"), "the rep instance does not belong to the owner");
     Declare(s, where, set.get(), Kind::Set);
-    Each(s, "annotations", where, [&](const Json& a, const Where& at) { Annotation(set.get(), a, at); });
-    Each(s, "views", where, [&](const Json& v, const Where& at) { View(set.get(), v, at); });
-    Each(s, "captures", where, [&](const Json& c, const Where& at) { Capture(set.get(), c, at); });
+    Each(s, index, 0, where, [&](const Json& a, const Where& at) { Annotation(set.get(), a, at); });
+    Each(s, index, 1, where, [&](const Json& v, const Where& at) { View(set.get(), v, at); });
+    Each(s, index, 2, where, [&](const Json& c, const Where& at) { Capture(set.get(), c, at); });
     if (auto it = s.find("otherElements"); it != s.end()) {
       Where at = where.Key("otherElements");
       std::vector<QelBaseUnknown*> others;
@@ -264,23 +291,25 @@ class Loader {
     if (it->second.kind != Kind::View && it->second.kind != Kind::Capture) {
       throw Refused(where, "'" + id + "' is not a view or capture");
     }
-    if (!SameSet(it->second.object.get(), set)) throw Refused(where, "'" + id + "' belongs to another set");
+    if (it->second.set != set) throw Refused(where, "'" + id + "' belongs to another set");
     return it->second.object.get();
   }
 
-  bool SameSet(QelBaseUnknown* member, QelBaseUnknown* set) {
-    return setOf_.count(member) && setOf_[member] == set;
-  }
-
+  // The elements of one of the set's lists, which the reader left as ranges of the text:
+  // each is parsed, loaded and dropped before the next.
   template <class Fn>
-  void Each(const Json& s, const char* key, const Where& where, Fn fn) {
+  void Each(const Json& s, size_t index, int list, const Where& where, Fn fn) {
+    const char* key = QelModelJsonReader::kListKeys[list];
     auto it = s.find(key);
     if (it == s.end()) return;
     Where listAt = where.Key(key);
-    const Json& list = Array(*it, listAt);
-    for (size_t i = 0; i < list.size(); ++i) {
+    Array(*it, listAt);
+    if (index >= lists_.size()) return;
+    const std::vector<QelModelJsonReader::Range>& ranges = lists_[index].lists[list];
+    for (size_t i = 0; i < ranges.size(); ++i) {
       Where at = listAt.At(static_cast<int>(i));
-      fn(Object(list[i], at), at);
+      const Json element = Json::parse(text_.data() + ranges[i].begin, text_.data() + ranges[i].end);
+      fn(Object(element, at), at);
     }
   }
 
@@ -293,10 +322,11 @@ class Loader {
     desc.typeName = String(Require(a, "type", where), where.Key("type"));
     desc.subTypeName = String(Require(a, "subType", where), where.Key("subType"));
     Where codeAt = where.Key("code");
-    desc.typeCode = Integer(Require(a, "code", where), codeAt);
-    if (desc.typeCode < QelTPSTypeClassifier::kFirstTypeCode || desc.typeCode > QelTPSTypeClassifier::kLastTypeCode) {
-      throw Refused(codeAt, "unknown type code " + std::to_string(desc.typeCode) + " (known codes are 1 to 13)");
+    const int64_t code = Integer(Require(a, "code", where), codeAt);
+    if (code < QelTPSTypeClassifier::kFirstTypeCode || code > QelTPSTypeClassifier::kLastTypeCode) {
+      throw Refused(codeAt, "unknown type code " + std::to_string(code) + " (known codes are 1 to 13)");
     }
+    desc.typeCode = static_cast<int>(code);
     desc.geometry = OptBool(a, "geometry", where, false);
     if (auto it = a.find("names"); it != a.end()) {
       Where at = where.Key("names");
@@ -325,8 +355,7 @@ class Loader {
       }
     }
     QelBaseUnknown_var made = builder_.AddAnnotation(QelBaseUnknown_var(set), desc);
-    setOf_[made.get()] = set;
-    Declare(a, where, made.get(), Kind::Annotation);
+    Declare(a, where, made.get(), Kind::Annotation, set);
   }
 
   std::vector<QelBaseUnknown*> Refs(const Json& v, const char* key, const Where& where, Kind kind, const char* what,
@@ -338,9 +367,9 @@ class Loader {
     const Json& list = Array(*it, at);
     for (size_t i = 0; i < list.size(); ++i) {
       Where refAt = at.At(static_cast<int>(i));
-      QelBaseUnknown* found = Lookup(list[i], refAt, kind, what);
-      if (set && !SameSet(found, set)) throw Refused(refAt, "'" + list[i].get<std::string>() + "' belongs to another set");
-      out.push_back(found);
+      const Entry& found = Lookup(list[i], refAt, kind, what);
+      if (set && found.set != set) throw Refused(refAt, "'" + list[i].get<std::string>() + "' belongs to another set");
+      out.push_back(found.object.get());
     }
     return out;
   }
@@ -369,8 +398,7 @@ class Loader {
     desc.relatedViews = Refs(v, "related", where, Kind::View, "view", nullptr);
     desc.shown = OptBool(v, "shown", where, true);
     QelBaseUnknown_var made = builder_.AddView(QelBaseUnknown_var(set), desc);
-    setOf_[made.get()] = set;
-    Declare(v, where, made.get(), Kind::View);
+    Declare(v, where, made.get(), Kind::View, set);
   }
 
   void Capture(QelBaseUnknown* set, const Json& c, const Where& where) {
@@ -379,8 +407,9 @@ class Loader {
     desc.alias = OptString(c, "alias", where, "");
     desc.icon = OptString(c, "icon", where, "I_Capture");
     if (auto it = c.find("view"); it != c.end() && !it->is_null()) {
-      desc.view = Lookup(*it, where.Key("view"), Kind::View, "view");
-      if (!SameSet(desc.view, set)) throw Refused(where.Key("view"), "the view belongs to another set");
+      const Entry& view = Lookup(*it, where.Key("view"), Kind::View, "view");
+      if (view.set != set) throw Refused(where.Key("view"), "the view belongs to another set");
+      desc.view = view.object.get();
     }
     if (auto it = c.find("camera"); it != c.end() && !it->is_null()) {
       Where at = where.Key("camera");
@@ -392,13 +421,13 @@ class Loader {
     }
     desc.shown = OptBool(c, "shown", where, true);
     QelBaseUnknown_var made = builder_.AddCapture(QelBaseUnknown_var(set), desc);
-    setOf_[made.get()] = set;
-    Declare(c, where, made.get(), Kind::Capture);
+    Declare(c, where, made.get(), Kind::Capture, set);
   }
 
   QelModelBuilder& builder_;
+  const std::string& text_;
+  const std::vector<QelModelJsonReader::SetLists>& lists_;
   std::unordered_map<std::string, Entry> ids_;
-  std::unordered_map<QelBaseUnknown*, QelBaseUnknown*> setOf_;
 };
 
 // The parser quotes what it last read, which for a binary file is raw bytes: escape what
@@ -438,8 +467,9 @@ HRESULT QelModelLoader::LoadText(const std::string& text, const std::string& sou
   error.clear();
   try {
     Json doc;
+    std::vector<QelModelJsonReader::SetLists> lists;
     try {
-      doc = Json::parse(text);
+      QelModelJsonReader::Read(text, doc, lists);
     } catch (const Json::parse_error& e) {
       // The parser's own text starts with its exception name; keep only the explanation.
       std::string what = e.what();
@@ -449,34 +479,87 @@ HRESULT QelModelLoader::LoadText(const std::string& text, const std::string& sou
     }
     QelModelBuilder builder(Loader::RootDesc(doc));
     builder.SetSourceName(sourceName);
-    Loader(builder).Load(doc);
+    Loader(builder, text, lists).Load(doc);
     root = builder.Finish();
     return S_OK;
-  } catch (const Refused& e) {
-    error = sourceName + ": " + e.what();
+  } catch (const std::bad_alloc&) {
+    error = sourceName + ": not enough memory to load the model";
   } catch (const std::exception& e) {
     error = sourceName + ": " + e.what();
   }
+  root = nullptr;
   return E_FAIL;
 }
 
+namespace {
+// Reads a regular file of at most kMaxFileBytes into `text`. Opened without blocking and
+// checked on the open descriptor, so a pipe or a device cannot stall or flood the reader.
+bool ReadModelFile(const std::string& path, std::string& text, std::string& error) {
+  const int fd = ::open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
+  if (fd < 0) {
+    error = path + ": cannot open the file";
+    return false;
+  }
+  struct Closer {
+    int fd;
+    ~Closer() { ::close(fd); }
+  } closer{fd};
+  struct stat info {};
+  if (::fstat(fd, &info) != 0) {
+    error = path + ": cannot read the file";
+    return false;
+  }
+  if (S_ISDIR(info.st_mode)) {
+    error = path + ": is a folder, not a model file";
+    return false;
+  }
+  if (!S_ISREG(info.st_mode)) {
+    error = path + ": not a regular file (a model is read from a regular file)";
+    return false;
+  }
+  const auto tooLarge = [&](uint64_t bytes) {
+    error = path + ": the file is too large (" + std::to_string(bytes) + " bytes; a model file may have at most " +
+            std::to_string(kMaxFileBytes) + " bytes)";
+    return false;
+  };
+  if (static_cast<uint64_t>(info.st_size) > kMaxFileBytes) return tooLarge(static_cast<uint64_t>(info.st_size));
+  text.resize(static_cast<size_t>(info.st_size));
+  size_t got = 0;
+  char more[4096];
+  for (;;) {
+    // The file may have changed since fstat: read what is there, into the text while it
+    // fits and then in small steps, so that the text is never copied to grow.
+    const bool inText = got < text.size();
+    const ssize_t n = inText ? ::read(fd, text.data() + got, text.size() - got) : ::read(fd, more, sizeof more);
+    if (n < 0 && errno == EINTR) continue;
+    if (n < 0) {
+      error = path + ": cannot read the file";
+      return false;
+    }
+    if (n == 0) break;
+    if (!inText) {
+      if (got + static_cast<size_t>(n) > kMaxFileBytes) return tooLarge(got + static_cast<size_t>(n));
+      text.append(more, static_cast<size_t>(n));
+    }
+    got += static_cast<size_t>(n);
+  }
+  text.resize(got);
+  return true;
+}
+}  // namespace
+
 HRESULT QelModelLoader::LoadFile(const std::string& path, QelBaseUnknown_var& root, std::string& error) {
   root = nullptr;
-  std::error_code ec;
-  if (std::filesystem::is_directory(path, ec)) {
-    error = path + ": is a folder, not a model file";
-    return E_FAIL;
+  error.clear();
+  try {
+    std::string text;
+    if (!ReadModelFile(path, text, error)) return E_FAIL;
+    return LoadText(text, path, root, error);
+  } catch (const std::bad_alloc&) {
+    error = path + ": not enough memory to read the file";
+  } catch (const std::exception& e) {
+    error = path + ": " + e.what();
   }
-  std::ifstream in(path, std::ios::binary);
-  if (!in) {
-    error = path + ": cannot open the file";
-    return E_FAIL;
-  }
-  std::ostringstream text;
-  text << in.rdbuf();
-  if (in.bad()) {
-    error = path + ": cannot read the file";
-    return E_FAIL;
-  }
-  return LoadText(text.str(), path, root, error);
+  root = nullptr;
+  return E_FAIL;
 }
