@@ -160,8 +160,7 @@ void QelRovFacetAnnotation::Refresh() {
   defaultAnnot->SetCheckState(filterData->DefaultAnnot ? Checked : Unchecked);
   tolAnnot->SetCheckState(filterData->TolAnnot ? Checked : Unchecked);
   ClearDynamicProperties();
-  BuildTypeProperties(root.get(), filterData);
-  BuildKindProperties(root.get(), filterData);
+  BuildDynamicProperties(root.get(), filterData);
 }
 
 void QelRovFacetAnnotation::Rebuild() {
@@ -170,8 +169,23 @@ void QelRovFacetAnnotation::Rebuild() {
   QelRovFacetFilterData* filterData = nullptr;
   QelRovFacetGroup::GetRootAndFilterData(FacetGroupRef(), root, filterData);
   if (!root) return;
-  BuildTypeProperties(root.get(), filterData);
-  BuildKindProperties(root.get(), filterData);
+  BuildDynamicProperties(root.get(), filterData);
+}
+
+void QelRovFacetAnnotation::BuildDynamicProperties(QelBaseUnknown* root, QelRovFacetFilterData* filterData) {
+  QelListValQelBaseUnknown_var annotations;
+  if (root) QelRovFacetServices::ListAnnotationsOfVisibleSets(root, annotations);
+  std::vector<signed char> visu(static_cast<size_t>(annotations.Size()), -1);
+  BuildTypeRows(root, filterData, &annotations, &visu);
+  BuildKindRows(root, filterData, &annotations, &visu);
+}
+
+HRESULT QelRovFacetAnnotation::BuildTypeProperties(QelBaseUnknown* root, QelRovFacetFilterData* filterData) {
+  return BuildTypeRows(root, filterData, nullptr, nullptr);
+}
+
+HRESULT QelRovFacetAnnotation::BuildKindProperties(QelBaseUnknown* root, QelRovFacetFilterData* filterData) {
+  return BuildKindRows(root, filterData, nullptr, nullptr);
 }
 
 void QelRovFacetAnnotation::ClearDynamicProperties() {
@@ -195,7 +209,9 @@ void QelRovFacetAnnotation::ClearDynamicProperties() {
   }
 }
 
-HRESULT QelRovFacetAnnotation::BuildTypeProperties(QelBaseUnknown* root, QelRovFacetFilterData* filterData) {
+HRESULT QelRovFacetAnnotation::BuildTypeRows(QelBaseUnknown* root, QelRovFacetFilterData* filterData,
+                                             const QelListValQelBaseUnknown_var* listed,
+                                             std::vector<signed char>* visu) {
   if (!root || !filterData || PropertyList().Size() != kPropertyCount) {
     QelAssertBool("root, filter data and 5 properties");
     return E_UNEXPECTED;
@@ -224,8 +240,9 @@ HRESULT QelRovFacetAnnotation::BuildTypeProperties(QelBaseUnknown* root, QelRovF
     }
   }
 
-  QelListValQelBaseUnknown_var annotations;
-  QelRovFacetServices::ListAnnotationsOfVisibleSets(root, annotations);
+  QelListValQelBaseUnknown_var own;
+  if (!listed) QelRovFacetServices::ListAnnotationsOfVisibleSets(root, own);
+  const QelListValQelBaseUnknown_var& annotations = listed ? *listed : own;
   if (annotations.Size() == 0) return S_OK;
   QelBaseUnknown_var made;
   QelLumInstantiateComponentBase(kNamingComponent, made);
@@ -234,12 +251,15 @@ HRESULT QelRovFacetAnnotation::BuildTypeProperties(QelBaseUnknown* root, QelRovF
     QelAssertPointer("QelILumNamingComponent");
     return E_UNEXPECTED;
   }
-  for (const QelBaseUnknown_var& annotation : annotations) {
+  for (int position = 1; position <= annotations.Size(); ++position) {
+    const QelBaseUnknown_var& annotation = annotations[position];
     if (!annotation) {
       QelAssertNullHandler();
       continue;
     }
-    if (IsTextOrDimensionVisu(annotation.get())) continue;
+    const bool isVisu = IsTextOrDimensionVisu(annotation.get());
+    if (visu) (*visu)[static_cast<size_t>(position - 1)] = isVisu ? 1 : 0;
+    if (isVisu) continue;
     QelUnicodeString typeName;
     QelUnicodeString subTypeName;
     naming->GetTypeName(annotation.get(), typeName);
@@ -265,7 +285,9 @@ HRESULT QelRovFacetAnnotation::BuildTypeProperties(QelBaseUnknown* root, QelRovF
   return S_OK;
 }
 
-HRESULT QelRovFacetAnnotation::BuildKindProperties(QelBaseUnknown* root, QelRovFacetFilterData* filterData) {
+HRESULT QelRovFacetAnnotation::BuildKindRows(QelBaseUnknown* root, QelRovFacetFilterData* filterData,
+                                             const QelListValQelBaseUnknown_var* listed,
+                                             const std::vector<signed char>* visu) {
   if (!root || !filterData || PropertyList().Size() != kPropertyCount) {
     QelAssertBool("root, filter data and 5 properties");
     return E_UNEXPECTED;
@@ -277,11 +299,13 @@ HRESULT QelRovFacetAnnotation::BuildKindProperties(QelBaseUnknown* root, QelRovF
     QelAssertBool("7 kind groups");
     return E_UNEXPECTED;
   }
-  QelListValQelBaseUnknown_var annotations;
-  QelRovFacetServices::ListAnnotationsOfVisibleSets(root, annotations);
+  QelListValQelBaseUnknown_var own;
+  if (!listed) QelRovFacetServices::ListAnnotationsOfVisibleSets(root, own);
+  const QelListValQelBaseUnknown_var& annotations = listed ? *listed : own;
   if (annotations.Size() == 0) return S_OK;
   QelVar<QelITPSTypeClassifier> classifier;
-  for (const QelBaseUnknown_var& annotation : annotations) {
+  for (int position = 1; position <= annotations.Size(); ++position) {
+    const QelBaseUnknown_var& annotation = annotations[position];
     if (!annotation) {
       QelAssertNullHandler();
       continue;
@@ -302,7 +326,9 @@ HRESULT QelRovFacetAnnotation::BuildKindProperties(QelBaseUnknown* root, QelRovF
     type->GetTypeCode(code);
     type = nullptr;
     typeObject = nullptr;
-    if (code == kUnclassifiedCode || IsTextOrDimensionVisu(annotation.get())) continue;
+    if (code == kUnclassifiedCode) continue;
+    const signed char known = visu ? (*visu)[static_cast<size_t>(position - 1)] : -1;
+    if (known == 1 || (known < 0 && IsTextOrDimensionVisu(annotation.get()))) continue;
     const int kindIndex = KindOfTypeCode(code);
     if (kindIndex == 0) {
       QelAssertBool("annotation type code of a kind");

@@ -4,6 +4,8 @@
 // switch and a tolerance range refine every choice through the group's filter data.
 // Made and held by the facet group; type groups, type rows and annotation rows live from
 // one build to the next, the five choices and the seven kind groups as long as the facet.
+#include <vector>
+
 #include "QelRovFacet.h"
 
 class QelRovFacetFilterData;
@@ -36,6 +38,16 @@ class QelRovFacetAnnotation : public QelRovFacet {
 
  private:
   void ClearDynamicProperties();
+  // Both builds over one listing of the visible annotations, the type build telling the
+  // kind build which annotations are text or dimension objects: those questions are the
+  // dearest of a pass.
+  void BuildDynamicProperties(QelBaseUnknown* root, QelRovFacetFilterData* filterData);
+  // `annotations` null: listed here. `visu`, per annotation: -1 not asked yet, else
+  // whether it is a text or dimension object.
+  HRESULT BuildTypeRows(QelBaseUnknown* root, QelRovFacetFilterData* filterData,
+                        const QelListValQelBaseUnknown_var* annotations, std::vector<signed char>* visu);
+  HRESULT BuildKindRows(QelBaseUnknown* root, QelRovFacetFilterData* filterData,
+                        const QelListValQelBaseUnknown_var* annotations, const std::vector<signed char>* visu);
   QelRovFacetPropertyGroup* GroupAt(int position) const;
   bool IsProperty(int position, QelBaseUnknown* property) const;
 };
