@@ -140,6 +140,28 @@ TEST_F(TypeFacet, TolerenceSwitchKeepsTheRangeAndReappliesTheKindChoice) {
   EXPECT_FALSE(Shown(a1));  // no tolerance value: outside every range
 }
 
+// Annotations that fall in no kind leave the seven kind groups empty: no fault to report.
+TEST(TypeFacetKinds, AnnotationsOfNoKindLeaveTheKindGroupsEmptyWithoutReport) {
+  QelModelBuilder builder;
+  QelModelSetDesc setDesc;
+  setDesc.alias = "S";
+  QelBaseUnknown_var set = builder.AddSet(builder.Root(), setDesc);
+  QelModelAnnotationDesc desc;
+  desc.alias = "Flag";
+  desc.typeName = "Note";
+  desc.typeCode = 4;
+  builder.AddAnnotation(set, desc);
+  FacetModel model(builder.Finish());
+  auto facet = Make<QelRovFacetAnnotation>(model.group.get());
+  model.group->SetFacets(model.other.get(), model.other.get(), facet.get(), model.filter.get());
+  QelAssertionCapture capture;
+  facet->Refresh();
+  EXPECT_EQ(capture.Count(), 0);
+  auto* custom = QelSysDynamicCast<QelRovFacetPropertyGroup>(PropertyOf(facet.get(), kCustom));
+  EXPECT_EQ(custom->CountItems(), 0);
+  EXPECT_EQ(ChildLabels(PropertyOf(facet.get(), kType)), (std::vector<std::string>{"Note"}));
+}
+
 // The catalogs are read once per process, so the missing key is tried in a fresh one.
 TEST(TypeFacetCatalog, MissingKindKeyGivesAnEmptyLabelAndOneReport) {
   GTEST_FLAG_SET(death_test_style, "threadsafe");
