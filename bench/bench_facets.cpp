@@ -6,7 +6,12 @@
 #include <string>
 #include <vector>
 
+#include "QelApplicationFrame.h"
+#include "QelDlgNotify.h"
+#include "QelFrmEditor.h"
 #include "QelIRovFacetPropertyObserver.h"
+#include "QelRovFacet.h"
+#include "QelRovFacetGroup.h"
 #include "QelModelBuilder.h"
 #include "QelRovFacetFilterData.h"
 #include "QelRovFacetPropertyGroup.h"
@@ -95,6 +100,117 @@ void BM_RefreshCheckState(benchmark::State& state) {
 }
 BENCHMARK(BM_RefreshCheckState)->RangeMultiplier(10)->Range(1000, 100000)->Complexity(benchmark::oN)
     ->Unit(benchmark::kMillisecond);
+
+// The three facets of a facet group over a generated model: `count` annotations in 20
+// sets, most of them of one type with 1000 sub-types (the case where finding a type row
+// must not scan the rows), codes over the seven kinds, and 250 views and 250 captures.
+class BenchFacetGroup final : public QelRovFacetGroup {
+ public:
+  using QelRovFacetGroup::QelRovFacetGroup;
+
+ private:
+  ~BenchFacetGroup() override = default;
+};
+
+struct FacetModel {
+  explicit FacetModel(int count) {
+    constexpr int kSets = 20;
+    constexpr int kViews = 250;
+    constexpr int kCodes[] = {3, 5, 6, 7, 8, 9, 13};
+    QelModelBuilder builder;
+    std::vector<QelBaseUnknown_var> sets;
+    for (int s = 0; s < kSets; ++s) {
+      QelModelProductDesc part;
+      part.alias = "Part" + std::to_string(s);
+      QelBaseUnknown_var owner = builder.AddProduct(builder.Root(), part);
+      QelModelSetDesc desc;
+      desc.alias = "Set" + std::to_string(s);
+      desc.rootScope = s % 4 == 0 ? QelRootSetScope::Direct : QelRootSetScope::None;
+      sets.push_back(builder.AddSet(owner, desc));
+    }
+    QelModelAnnotationDesc desc;
+    for (int i = 0; i < count; ++i) {
+      desc.alias = "A" + std::to_string(i);
+      desc.typeName = i % 10 == 0 ? "Other" + std::to_string(i % 7) : "Tolerance";
+      desc.subTypeName = "Sub" + std::to_string(i % 1000);
+      desc.typeCode = kCodes[i % 7];
+      desc.geometry = desc.typeCode == 13;
+      desc.isDefault = i % 3 == 0;
+      builder.AddAnnotation(sets[static_cast<size_t>(i % kSets)], desc);
+    }
+    for (int v = 0; v < kViews; ++v) {
+      QelModelViewDesc view;
+      view.alias = "V" + std::to_string(v);
+      QelBaseUnknown_var made = builder.AddView(sets[static_cast<size_t>(v % kSets)], view);
+      QelModelCaptureDesc capture;
+      capture.alias = "C" + std::to_string(v);
+      capture.view = made.get();
+      builder.AddCapture(sets[static_cast<size_t>(v % kSets)], capture);
+    }
+    root = builder.Finish();
+    QelApplicationFrame::CreateFrame();
+    editor = QelMakeVar<QelFrmEditor>(root.get());
+    group = QelMakeVar<BenchFacetGroup>(editor.get());
+    group->InitFacets();
+    QelListValQelBaseUnknown_var list;
+    group->ListFacets(list);
+    for (const auto& facet : list) facets.push_back(QelVar<QelRovFacet>(facet.get()));
+  }
+  QelRovFacet* Facet(int index) { return facets[static_cast<size_t>(index)].get(); }
+  QelRovFacetProperty* Property(int facet, int position) {
+    QelListValQelBaseUnknown_var properties;
+    Facet(facet)->GetProperties(properties);
+    return QelSysDynamicCast<QelRovFacetProperty>(properties[position].get());
+  }
+
+  QelBaseUnknown_var root;
+  QelVar<QelFrmEditor> editor;
+  QelVar<BenchFacetGroup> group;
+  std::vector<QelVar<QelRovFacet>> facets;  // sets, views, types
+};
+
+enum { kSetFacet, kViewFacet, kTypeFacet };
+
+void BM_FacetRefresh(benchmark::State& state) {
+  FacetModel model(static_cast<int>(state.range(1)));
+  QelRovFacet* facet = model.Facet(static_cast<int>(state.range(0)));
+  for (auto _ : state) facet->Refresh();
+  state.SetComplexityN(state.range(1));
+}
+BENCHMARK(BM_FacetRefresh)->ArgNames({"facet", "annotations"})->ArgsProduct({{kSetFacet, kViewFacet, kTypeFacet}, {10000, 100000}})
+    ->Unit(benchmark::kMillisecond);
+
+// A tick of "all" on each facet, with what the group refreshes after it. The choice is
+// unset between ticks by a plain state assignment, outside the timing.
+void BM_TickAll(benchmark::State& state) {
+  FacetModel model(static_cast<int>(state.range(1)));
+  QelRovFacetProperty* all = model.Property(static_cast<int>(state.range(0)), 1);
+  for (auto _ : state) {
+    state.PauseTiming();
+    all->SetCheckState(Unchecked);
+    QelDlgNotify::QueueAnswer(QelDlgNotify::AnswerYes);
+    state.ResumeTiming();
+    benchmark::DoNotOptimize(all->SetCheck(true));
+  }
+  QelDlgNotify::ClearAnswers();
+  state.SetComplexityN(state.range(1));
+}
+BENCHMARK(BM_TickAll)->ArgNames({"facet", "annotations"})->ArgsProduct({{kSetFacet, kViewFacet, kTypeFacet}, {10000, 100000}})
+    ->Unit(benchmark::kMillisecond);
+
+// Unticking and ticking the Datums kind group in turn.
+void BM_TickKindGroup(benchmark::State& state) {
+  FacetModel model(static_cast<int>(state.range(0)));
+  auto* custom = QelSysDynamicCast<QelRovFacetPropertyGroup>(model.Property(kTypeFacet, 3));
+  auto* datums = QelSysDynamicCast<QelRovFacetProperty>(custom->GetPropertyList()[1].get());
+  bool checked = false;
+  for (auto _ : state) {
+    benchmark::DoNotOptimize(datums->SetCheck(checked));
+    checked = !checked;
+  }
+  state.SetComplexityN(state.range(0));
+}
+BENCHMARK(BM_TickKindGroup)->Arg(10000)->Arg(100000)->Unit(benchmark::kMillisecond);
 
 }  // namespace
 

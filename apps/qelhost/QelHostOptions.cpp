@@ -38,6 +38,8 @@ const char* QelHostOptions::Usage() {
          "                       0.05<=t<0.2, t<=0.1, 0.1<t, t=0.05, or any\n"
          "  --module FILE        the plug-in to load (default libQelRovFacets.so, next to qelhost)\n"
          "  --list-module        list what the plug-in registered with the host\n"
+         "  --script FILE        run the review session's commands from FILE (without it the\n"
+         "                       session reads a terminal with a prompt, or standard input)\n"
          "  --setting REPO/KEY[=VALUE]\n"
          "                       print a user setting, or write and save it\n"
          "  -h, --help           show this help and exit\n"
@@ -129,6 +131,8 @@ bool QelHostOptions::Parse(const std::vector<std::string>& args, QelHostOptions&
       options.tolerance = range;
     } else if (arg == "--module") {
       if (!value(options.modulePath)) return false;
+    } else if (arg == "--script") {
+      if (!value(options.scriptPath)) return false;
     } else if (arg == "--list-module") {
       options.listModule = true;
     } else if (arg == "--setting") {

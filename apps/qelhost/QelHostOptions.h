@@ -31,6 +31,7 @@ struct QelHostOptions {
   std::string modelPath;  // empty: the embedded sample
   std::string modulePath = "libQelRovFacets.so";
   bool listModule = false;
+  std::string scriptPath;  // empty: the session reads the terminal or standard input
   std::vector<DisplayChange> displayChanges;
   bool defaultOnly = false;
   std::optional<QelToleranceRange> tolerance;

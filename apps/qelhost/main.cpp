@@ -1,14 +1,18 @@
 // qelhost: the reference host program. It stands in for the design application: opens a
 // product model, loads the QelRovFacets plug-in and shows what a reviewer would see.
+#include <unistd.h>
+
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <fstream>
 #include <iostream>
 #include <string>
 #include <vector>
 
 #include "QelDictionary.h"
 #include "QelHostOptions.h"
+#include "QelHostSession.h"
 #include "QelModelLoader.h"
 #include "QelModelPrinter.h"
 #include "QelModuleLoader.h"
@@ -98,6 +102,29 @@ void* LoadPlugin(const QelHostOptions& options) {
     for (const auto& line : registered) std::printf("  %s\n", line.c_str());
   return module;
 }
+// The review session on the open model: the script given, else a person at the
+// terminal, else the commands on standard input.
+int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
+  QelHostSession session(std::cout, std::cerr);
+  std::string error;
+  const std::string name = options.modelPath.empty() ? kQelSampleProductName : options.modelPath;
+  if (!session.Attach(root, name, error)) {
+    std::fprintf(stderr, "qelhost: %s\n", error.c_str());
+    return 1;
+  }
+  if (!options.scriptPath.empty()) {
+    std::ifstream script(options.scriptPath);
+    if (!script) {
+      std::fprintf(stderr, "qelhost: cannot read the script %s\n", options.scriptPath.c_str());
+      return 1;
+    }
+    return session.RunScript(script, options.scriptPath);
+  }
+  // A terminal on both sides is a person; a terminal that nobody reads the answers of
+  // (output captured by a test runner or a file) gets no session rather than a wait.
+  if (isatty(STDIN_FILENO)) return isatty(STDOUT_FILENO) ? session.RunInteractive() : 0;
+  return session.RunScript(std::cin, "stdin");
+}
 }  // namespace
 
 int main(int argc, char** argv) {
@@ -131,5 +158,5 @@ int main(int argc, char** argv) {
   if (options.defaultOnly || options.tolerance) ApplyFilter(root.get(), options);
   std::cout << '\n';
   QelModelPrinter::Print(root.get(), std::cout);
-  return 0;
+  return RunSession(root, options);
 }

@@ -59,6 +59,7 @@ class TestFacet : public QelRovFacet {
   void Name(const char* name) { SetFacetName(QelUnicodeString(name)); }
 
   void Refresh() override { ++refreshes; }
+  void Rebuild() override { ++rebuilds; }
   HRESULT CanChangeCheckState(QelBaseUnknown* property, QelCheckState state) override {
     return veto == S_OK ? QelRovFacet::CanChangeCheckState(property, state) : veto;
   }
@@ -70,6 +71,7 @@ class TestFacet : public QelRovFacet {
   HRESULT applyAnswer = S_OK;
   HRESULT veto = S_OK;  // what CanChangeCheckState answers when not S_OK
   int refreshes = 0;
+  int rebuilds = 0;
   std::vector<QelBaseUnknown*> applied;
 
  protected:

@@ -10,6 +10,7 @@
 #include "QelILumLightLoadModeObserver.h"
 #include "QelModelBuilder.h"
 #include "QelRovFacetFilterData.h"
+#include "QelRovFacetServices.h"
 
 namespace {
 
@@ -129,6 +130,48 @@ TEST_F(QelRovFacetGroupDependents, ViewChangeClearsTheSwitchesAndRefreshesTypes)
   EXPECT_EQ(types->refreshes, 1);
   EXPECT_EQ(group->OnPropertyChanged(types.get()), S_OK);
   EXPECT_EQ(views->refreshes, 1);
+}
+
+TEST_F(QelRovFacetGroupDependents, LoadModeChangeRebuildsEveryFacetWithoutRefreshingIt) {
+  EXPECT_EQ(group->OnLightLoadModeChanged(), S_OK);
+  EXPECT_EQ(sets->rebuilds + views->rebuilds + types->rebuilds, 3);
+  EXPECT_EQ(sets->refreshes + views->refreshes + types->refreshes, 0);
+}
+
+// The real facets over a model, made by the group: the panel order, the sets component's
+// mode test leaving out the type facet, and no cycle once group and model are dropped.
+TEST(QelRovFacetGroupFacets, InitFacetsMakesTheFacetsOnceAndTheModeTestMayLeaveOutTypes) {
+  const int64_t before = QelBaseUnknown::LiveObjectCount();
+  {
+    QelModelBuilder builder;
+    QelBaseUnknown_var part = AddPart(builder);
+    AddSet(builder, part.get(), "Light", true);
+    QelBaseUnknown_var root = builder.Finish();
+    auto editor = EditorOn(root.get());
+    auto group = Make<TestFacetGroup>(editor.get());
+    QelListValQelBaseUnknown_var facets;
+    EXPECT_EQ(group->ListFacets(facets), S_OK);
+    ASSERT_EQ(facets.Size(), 3);
+    EXPECT_STREQ(facets[1]->GetMetaObject()->Name(), "QelRovFacetAnnotationSet");
+    EXPECT_STREQ(facets[2]->GetMetaObject()->Name(), "QelRovFacetView");
+    EXPECT_STREQ(facets[3]->GetMetaObject()->Name(), "QelRovFacetAnnotation");
+    group->GetFilterData()->DefaultAnnot = true;
+    EXPECT_EQ(group->InitFacets(), S_OK);
+    EXPECT_FALSE(group->GetFilterData()->DefaultAnnot);
+    QelListValQelBaseUnknown_var again;
+    group->ListFacets(again);
+    EXPECT_TRUE(again[1]->IsEqual(facets[1].get()));
+    group->AddLightLoadModeObservers();
+    EXPECT_EQ(QelModelBuilder::SwitchLightLoadMode(part, true), S_OK);
+
+    QelRovFacetServices::SetLumSetModes(true, false, false);
+    auto reviewOnly = Make<TestFacetGroup>(editor.get());
+    QelListValQelBaseUnknown_var two;
+    reviewOnly->ListFacets(two);
+    QelRovFacetServices::SetLumSetModes(false, false, false);
+    EXPECT_EQ(two.Size(), 2);
+  }
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), before);
 }
 
 TEST(QelRovFacetGroupLifetime, GroupWithFacetsAndItemsDroppedLeavesNothingAlive) {

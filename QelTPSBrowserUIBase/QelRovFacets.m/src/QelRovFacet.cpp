@@ -35,6 +35,12 @@ QelVar<QelRovFacetGroup> QelRovFacet::GetFacetGroup() const {
   return QelVar<QelRovFacetGroup>(group.get());
 }
 
+QelRovFacetProperty* QelRovFacet::PropertyAt(int position) const {
+  QelRovFacetProperty* property = QelSysDynamicCast<QelRovFacetProperty>(properties_[position].get());
+  if (!property) QelAssertPointer("QelRovFacetProperty");
+  return property;
+}
+
 HRESULT QelRovFacet::GetFacetName(QelUnicodeString& name) const {
   name = name_;
   return name_.IsEmpty() ? E_FAIL : S_OK;

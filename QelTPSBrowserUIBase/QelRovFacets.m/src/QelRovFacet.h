@@ -9,6 +9,7 @@
 #include "QelUnicodeString.h"
 
 class QelRovFacetGroup;
+class QelRovFacetProperty;
 
 class QelRovFacet : public virtual QelBaseUnknown {
  public:
@@ -17,6 +18,9 @@ class QelRovFacet : public virtual QelBaseUnknown {
 
   // Sets the facet's default check states and rebuilds its dynamic properties.
   virtual void Refresh() = 0;
+  // Rebuilds the dynamic properties only, keeping the check states of the top-level
+  // ones; the facet group calls it when the sets' load mode changed.
+  virtual void Rebuild() {}
   // Copies the top-level properties into `properties`, which must be empty.
   virtual HRESULT GetProperties(QelListValQelBaseUnknown_var& properties);
   // Turns a change of one of the facet's properties into display requests. S_OK: the
@@ -41,6 +45,12 @@ class QelRovFacet : public virtual QelBaseUnknown {
   ~QelRovFacet() override;
 
   QelListValQelBaseUnknown_var& PropertyList() { return properties_; }
+  // The group's weak reference as the group's look-ups take it; resolving it through
+  // GetFacetGroup would report a gone group a second time.
+  const QelBaseUnknown_WR& FacetGroupRef() const { return group_; }
+  // The top-level property at `position` (1-based); null, after a report, when the entry
+  // is not a property.
+  QelRovFacetProperty* PropertyAt(int position) const;
   void SetFacetName(const QelUnicodeString& name) { name_ = name; }
 
  private:

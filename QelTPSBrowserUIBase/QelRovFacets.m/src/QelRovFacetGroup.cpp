@@ -10,6 +10,9 @@
 #include "QelITPSLightSet.h"
 #include "QelAnnotationComponents.h"
 #include "QelRovFacet.h"
+#include "QelRovFacetAnnotation.h"
+#include "QelRovFacetAnnotationSet.h"
+#include "QelRovFacetView.h"
 #include "QelRovFacetFilterData.h"
 #include "QelRovFacetServices.h"
 
@@ -59,6 +62,63 @@ void QelRovFacetGroup::SetFacets(QelRovFacet* annotationSet, QelRovFacet* view, 
   viewFacet_ = QelVar<QelRovFacet>::Retain(view);
   annotationTypeFacet_ = QelVar<QelRovFacet>::Retain(annotationType);
   filterData_ = QelVar<QelRovFacetFilterData>::Retain(filterData);
+}
+
+namespace {
+// The annotation type facet is left out only in light review mode with the type filter
+// neither allowed nor forced; without the sets component it is always made.
+bool AllowsAnnotationTypeFacet() {
+  QelBaseUnknown_var made;
+  QelLumInstantiateComponentBase(kSetComponent, made);
+  QelVar<QelILumSetComponent> component(made.get());
+  if (!component) return true;
+  bool lightReview = false;
+  component->IsLightReviewMode(lightReview);
+  if (!lightReview) return true;
+  bool allowed = false;
+  component->IsTypeFilterAllowed(allowed);
+  if (allowed) return true;
+  bool forced = false;
+  component->IsTypeFilterForced(forced);
+  return forced;
+}
+}  // namespace
+
+HRESULT QelRovFacetGroup::InitFacets() {
+  if (!filterData_) {
+    filterData_ = QelMakeVar<QelRovFacetFilterData>();
+    QelBaseUnknown* self = this;
+    annotationSetFacet_ = QelMakeVar<QelRovFacetAnnotationSet>(self);
+    viewFacet_ = QelMakeVar<QelRovFacetView>(self);
+    if (AllowsAnnotationTypeFacet()) annotationTypeFacet_ = QelMakeVar<QelRovFacetAnnotation>(self);
+  }
+  if (!filterData_ || !annotationSetFacet_ || !viewFacet_) {
+    QelAssertBool("facets");
+    return E_UNEXPECTED;
+  }
+  filterData_->DefaultAnnot = false;
+  filterData_->TolAnnot = false;
+  QelBaseUnknown_var self = QelBaseUnknown_var::Retain(this);
+  annotationSetFacet_->Refresh();
+  viewFacet_->Refresh();
+  if (annotationTypeFacet_) annotationTypeFacet_->Refresh();
+  return S_OK;
+}
+
+HRESULT QelRovFacetGroup::ListFacets(QelListValQelBaseUnknown_var& facets) {
+  if (facets.Size() != 0) {
+    QelAssertBool("empty list");
+    return E_UNEXPECTED;
+  }
+  if (!filterData_) InitFacets();
+  if (!annotationSetFacet_ || !viewFacet_) {
+    QelAssertBool("facets");
+    return E_UNEXPECTED;
+  }
+  facets.Append(static_cast<QelBaseUnknown*>(annotationSetFacet_.get()));
+  facets.Append(static_cast<QelBaseUnknown*>(viewFacet_.get()));
+  if (annotationTypeFacet_) facets.Append(static_cast<QelBaseUnknown*>(annotationTypeFacet_.get()));
+  return S_OK;
 }
 
 HRESULT QelRovFacetGroup::GetRootAndFilterData(const QelBaseUnknown_WR& group, QelBaseUnknown_var& root,
@@ -157,6 +217,10 @@ HRESULT QelRovFacetGroup::OnLightLoadModeChanged() {
     QelAssertPointer("facet");
     return E_UNEXPECTED;
   }
-  // Rebuilding the facets and the dialog's widgets comes with the panel behaviour.
+  QelBaseUnknown_var self = QelBaseUnknown_var::Retain(this);
+  annotationSetFacet_->Rebuild();
+  viewFacet_->Rebuild();
+  if (annotationTypeFacet_) annotationTypeFacet_->Rebuild();
+  // Rebuilding the dialog's widgets comes with the panel behaviour.
   return S_OK;
 }

@@ -33,6 +33,13 @@ class QelRovFacetGroup : public virtual QelBaseUnknown {
   static HRESULT GetRootAndFilterData(const QelBaseUnknown_WR& group, QelBaseUnknown_var& root,
                                       QelRovFacetFilterData*& filterData);
 
+  // Creates the filter data and the facets once (the annotation type facet only when the
+  // sets component allows it), clears the filter switches and refreshes every facet.
+  HRESULT InitFacets();
+  // Appends the facets in the order the panel shows them, creating them first if needed;
+  // `facets` must be empty.
+  HRESULT ListFacets(QelListValQelBaseUnknown_var& facets);
+
   // Subscribes to the light-load mode of the owners of the light sets under the root,
   // once: nothing happens while subscriptions exist.
   void AddLightLoadModeObservers();

@@ -68,6 +68,9 @@ QelRovFacetProperty* QelRovFacetPropertyGroup::ChildAt(int position) const {
 }
 
 HRESULT QelRovFacetPropertyGroup::StoreAggregate(QelCheckState aggregate) {
+  // A radio group without select-all item keeps no aggregate, so having no counted child
+  // (kind groups left empty by a pass) is no fault there.
+  if (!selectAll_ && !IsCheckBox()) return S_OK;
   if (aggregate == kNoState) {
     QelAssertBool("no counted child");
     return E_UNEXPECTED;

@@ -8,4 +8,7 @@ extern "C" {
 QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup(QelBaseUnknown* impl);
 QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetGroup(QelBaseUnknown* impl);
 QelBaseUnknown* CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup(QelBaseUnknown* impl);
+QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotationSet(QelBaseUnknown* impl);
+QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetView(QelBaseUnknown* impl);
+QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotation(QelBaseUnknown* impl);
 }

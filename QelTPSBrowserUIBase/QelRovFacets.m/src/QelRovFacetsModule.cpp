@@ -16,6 +16,11 @@
 #include "QelIRovFacetPropertyObserver.h"
 #include "QelModuleVersion.h"
 #include "QelRovFacet.h"
+#include "QelRovFacetAnnotation.h"
+#include "QelRovFacetAnnotationSet.h"
+#include "QelRovFacetReview.h"
+#include "QelRovFacetView.h"
+#include "QelIRovFacetReview.h"
 #include "QelRovFacetGroup.h"
 #include "QelRovFacetProperty.h"
 #include "QelRovFacetPropertyGroup.h"
@@ -44,12 +49,24 @@ void QelRovFacetsRegister() {
   dictionary.Register(QelRovFacetGroup::MetaObject().Name(), QelILumLightLoadModeObserver::IID,
                       &CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup, kFramework);
 
+  // The three facets, each the observer of its top-level properties.
+  dictionary.Register(QelRovFacetAnnotation::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
+                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotation, kFramework);
+  dictionary.Register(QelRovFacetAnnotationSet::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
+                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotationSet, kFramework);
+  dictionary.Register(QelRovFacetView::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
+                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetView, kFramework);
+
+  // The facets of one editor for host programs without widgets.
+  dictionary.RegisterNamedCreator("QelRovFacetReview", &QelRovFacetReview::Create, kFramework);
+
   // The property group.
   dictionary.Register(QelRovFacetPropertyGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
                       &CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup, kFramework);
 
   // The interfaces: the module's own, then the host's that it queries or implements.
   DescribeInterface<QelIRovFacetPropertyObserver>("QelIRovFacetPropertyObserver");
+  DescribeInterface<QelIRovFacetReview>("QelIRovFacetReview");
   DescribeInterface<QelITPSView>("QelITPSView");
   DescribeInterface<QelITPS>("QelITPS");
   DescribeInterface<QelILumSet>("QelILumSet");

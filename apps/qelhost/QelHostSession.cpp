@@ -1,0 +1,156 @@
+#include "QelHostSession.h"
+
+#include <editline/readline.h>
+
+#include <cstdlib>
+
+#include "QelApplicationFrame.h"
+#include "QelDictionary.h"
+#include "QelDlgNotify.h"
+#include "QelHostCommands.h"
+#include "QelIAlias.h"
+#include "QelModelLoader.h"
+#include "QelRovFacetServices.h"
+#include "QelSampleProduct.h"
+
+namespace {
+bool IsShown(QelBaseUnknown* object) { return QelRovFacetServices::IsDisplayEnabled(object) == S_OK; }
+
+std::string NameOf(QelBaseUnknown* object) {
+  QelUnicodeString alias;
+  if (QelVar<QelIAlias> named{object}) named->GetAlias(alias);
+  return alias.IsEmpty() ? std::string("(no name)") : alias.Utf8();
+}
+
+// One line from the terminal with editing and history; false at end of input.
+bool ReadLine(const char* prompt, std::string& line) {
+  char* read = readline(prompt);
+  if (!read) return false;
+  line = read;
+  std::free(read);
+  return true;
+}
+}  // namespace
+
+QelHostSession::QelHostSession(std::ostream& out, std::ostream& err) : out_(out), err_(err) {
+  // The questions the facets ask take the frame's main window as parent.
+  QelApplicationFrame::CreateFrame();
+  QelDlgNotify::SetRefusalReporter([this](const QelUnicodeString& report) { out_ << report.Utf8() << '\n'; });
+}
+
+QelHostSession::~QelHostSession() {
+  QelDlgNotify::SetRefusalReporter(nullptr);
+  QelDlgNotify::SetAsker(nullptr);
+  if (displayCallback_) QelCallbackManager::Get().RemoveCallback(displayCallback_);
+  review_ = nullptr;
+}
+
+bool QelHostSession::Open(const std::string& path, std::string& error) {
+  QelBaseUnknown_var root;
+  const HRESULT loaded = path.empty() ? QelModelLoader::LoadText(kQelSampleProductText, kQelSampleProductName, root, error)
+                                      : QelModelLoader::LoadFile(path, root, error);
+  if (loaded != S_OK) return false;
+  return Attach(root, path.empty() ? kQelSampleProductName : path, error);
+}
+
+bool QelHostSession::Attach(const QelBaseUnknown_var& root, const std::string& name, std::string& error) {
+  auto review = QelInstantiateComponent<QelIRovFacetReview>("QelRovFacetReview");
+  if (!review) {
+    error = "the plug-in gives no facet review (is it loaded?)";
+    return false;
+  }
+  auto editor = QelMakeVar<QelFrmEditor>(root.get());
+  // The root is the UI-active object, as when a product is opened.
+  auto active = QelMakeVar<QelPathElement>();
+  active->AddChildElement(root.get());
+  editor->SetUIActivePath(active.get());
+  if (displayCallback_) QelCallbackManager::Get().RemoveCallback(displayCallback_);
+  displayCallback_ = QelRovFacetServices::AddDisplayChangeCallback(
+      root.get(), editor.get(), [this](QelBaseUnknown*, QelBaseUnknown* object) {
+        if (!recording_ || !object) return;
+        QelBaseUnknown_var held(object);
+        if (shownBefore_.emplace(held->GetImpl(), !IsShown(object)).second) changed_.push_back(held);
+      });
+  review_ = nullptr;
+  root_ = root;
+  editor_ = editor;
+  review_ = review;
+  if (review_->Open(editor_.get()) != S_OK) {
+    error = "the facets could not be made";
+    return false;
+  }
+  out_ << "model " << name << " open\n";
+  return true;
+}
+
+void QelHostSession::BeginChanges() {
+  changed_.clear();
+  shownBefore_.clear();
+  recording_ = true;
+}
+
+void QelHostSession::EndChanges() {
+  recording_ = false;
+  std::string shown, hidden;
+  for (const auto& object : changed_) {
+    const bool now = IsShown(object.get());
+    if (now == shownBefore_[object->GetImpl()]) continue;
+    std::string& list = now ? shown : hidden;
+    list += (list.empty() ? "" : ", ") + NameOf(object.get());
+  }
+  if (shown.empty() && hidden.empty()) out_ << "  no display change\n";
+  if (!shown.empty()) out_ << "  shown: " << shown << '\n';
+  if (!hidden.empty()) out_ << "  hidden: " << hidden << '\n';
+  changed_.clear();
+  shownBefore_.clear();
+}
+
+bool QelHostSession::Execute(const std::string& line, std::string& error) {
+  std::vector<std::string> words;
+  if (!QelHostSplitLine(line, words, error)) return false;
+  if (words.empty() || words[0][0] == '#') return true;
+  for (const QelHostCommand& command : QelHostCommandTable()) {
+    if (words[0] != command.name) continue;
+    if (command.run(*this, std::vector<std::string>(words.begin() + 1, words.end()), error)) return true;
+    error = words[0] + ": " + error;
+    return false;
+  }
+  error = "unknown command \"" + words[0] + "\" (help lists the commands)";
+  return false;
+}
+
+int QelHostSession::RunScript(std::istream& in, const std::string& name) {
+  std::string line;
+  for (int number = 1; !quit_ && std::getline(in, line); ++number) {
+    std::string error;
+    if (!Execute(line, error)) {
+      out_.flush();
+      err_ << name << ":" << number << ": " << error << '\n';
+      return 1;
+    }
+  }
+  return 0;
+}
+
+int QelHostSession::RunInteractive() {
+  QelDlgNotify::SetAsker([this](const QelDlgNotify&, const QelUnicodeString& message, const QelUnicodeString& title) {
+    out_ << title.Utf8() << '\n' << message.Utf8() << '\n';
+    out_.flush();
+    for (std::string answer; ReadLine("yes/no? ", answer);) {
+      if (answer == "yes" || answer == "y") return QelDlgNotify::AnswerYes;
+      if (answer == "no" || answer == "n") return QelDlgNotify::AnswerNo;
+    }
+    return QelDlgNotify::AnswerNone;
+  });
+  out_ << "qelhost review session; help lists the commands\n";
+  std::string line;
+  for (int number = 1; !quit_; ++number) {
+    out_.flush();
+    if (!ReadLine("qelhost> ", line)) break;
+    if (!line.empty()) add_history(line.c_str());
+    std::string error;
+    if (!Execute(line, error)) out_ << "line " << number << ": " << error << '\n';
+  }
+  QelDlgNotify::SetAsker(nullptr);
+  return 0;
+}
