@@ -60,8 +60,8 @@ std::string Sanitized(std::string_view bytes) {
 struct PrintfConversion {
   bool ok = false;
   char type = 0;
-  bool lengthL = false;      // 'L' (long double), never accepted
-  bool otherLength = false;  // h, hh, j, z, t, ll: change the argument's type
+  bool anyLength = false;    // any length modifier at all
+  bool otherLength = false;  // anything but one 'l' (which only a double may carry, to no effect)
 };
 
 PrintfConversion ParsePrintfFormat(const char* format) {
@@ -78,16 +78,13 @@ PrintfConversion ParsePrintfFormat(const char* format) {
       while (*p >= '0' && *p <= '9') ++p;
     }
     if (*p == '*' || *p == '$') return {};
-    bool lengthL = false, otherLength = false;
-    while (*p && std::strchr("hljztL", *p)) {
-      if (*p == 'L') lengthL = true;
-      else if (*p != 'l') otherLength = true;
-      else if (p[1] == 'l') otherLength = true;
-      ++p;
-    }
+    const char* length = p;
+    while (*p && std::strchr("hljztL", *p)) ++p;
+    const bool anyLength = p != length;
+    const bool otherLength = anyLength && !(p - length == 1 && *length == 'l');
     if (!*p || !std::strchr("diouxXeEfFgGaAcspn", *p)) return {};
     if (++conversions > 1) return {};
-    found = {true, *p, lengthL, otherLength};
+    found = {true, *p, anyLength, otherLength};
   }
   return conversions == 1 ? found : PrintfConversion{};
 }
@@ -165,7 +162,7 @@ void QelUnicodeString::BuildFromNum(double value, const char* format) {
   text_.clear();
   if (!format) return;
   PrintfConversion conversion = ParsePrintfFormat(format);
-  if (!conversion.ok || conversion.lengthL || conversion.otherLength) return;
+  if (!conversion.ok || conversion.otherLength) return;
   if (!std::strchr("eEfFgGaA", conversion.type)) return;
   text_ = Sanitized(FormatOne(format, value));
 }
@@ -174,7 +171,8 @@ void QelUnicodeString::BuildFromNum(int value, const char* format) {
   text_.clear();
   if (!format) return;
   PrintfConversion conversion = ParsePrintfFormat(format);
-  if (!conversion.ok || conversion.lengthL || conversion.otherLength) return;
+  // An int takes no length modifier: "%ld" would read a long the caller never passed.
+  if (!conversion.ok || conversion.anyLength) return;
   if (!std::strchr("diouxX", conversion.type)) return;
   text_ = Sanitized(FormatOne(format, value));
 }
@@ -209,7 +207,8 @@ int QelUnicodeString::ConvertToNum(double* out, const char* format) const {
     errno = 0;
     value = std::strtod(field.c_str(), &end);
     if (end == field.c_str()) return 0;
-    if (errno == ERANGE && std::isinf(value)) return 0;
+    // strtod also reads "nan" and "inf"; no caller can compare or store those sensibly.
+    if (!std::isfinite(value)) return 0;
     text += end - field.c_str();
     converted = true;
   }
