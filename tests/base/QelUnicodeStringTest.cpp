@@ -69,13 +69,14 @@ TEST(QelUnicodeStringBuildFromNum, FormatsOneNumberOfTheRightType) {
 }
 
 TEST(QelUnicodeStringBuildFromNum, RefusedFormatLeavesTheTextEmpty) {
-  for (const char* format : {"%d", "%s", "%f %f", "%*f", "%.*f", "no conversion", "%Lf", "%n", "%", "%1$f"}) {
+  for (const char* format : {"%d", "%s", "%f %f", "%*f", "%.*f", "no conversion", "%Lf", "%n", "%", "%1$f", "%.1025f", "%999999999f"}) {
     QelUnicodeString text("previous");
     text.BuildFromNum(1.5, format);
     EXPECT_TRUE(text.IsEmpty()) << format;
   }
   // A length modifier would make printf read a wider argument than the int passed.
-  for (const char* format : {"%f", "%s", "%lld", "%hd", "%d%d", "%p", "%ld", "%lx", "%lu", "%li", "%zd", "%jd"}) {
+  for (const char* format : {"%f", "%s", "%lld", "%hd", "%d%d", "%p", "%ld", "%lx", "%lu", "%li", "%zd", "%jd", "%1025d",
+                             "%99999999999999999999999d"}) {
     QelUnicodeString text("previous");
     text.BuildFromNum(-1, format);
     EXPECT_TRUE(text.IsEmpty()) << format;

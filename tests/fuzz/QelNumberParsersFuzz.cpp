@@ -38,15 +38,19 @@ extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
   if (QelUnicodeString(text).ConvertToNum(&read, format.c_str()))
     QelFuzzCheck(std::isfinite(read), "ConvertToNum gives finite numbers");
   QelUnicodeString built;
+  // A number's text is short whatever the format asks: no gigabyte of padding.
+  const size_t longest = format.size() + 2048;
   for (double value : {read, -0.0, DBL_MAX, DBL_TRUE_MIN, double(NAN), -double(INFINITY)}) {
     built.BuildFromNum(value, format.c_str());
     QelFuzzCheck(QelUnicodeString::IsValidUtf8(built.Utf8()), "BuildFromNum gives valid UTF-8");
+    QelFuzzCheck(built.Utf8().size() <= longest, "a formatted double stays short");
     const std::string length = LengthModifier(format);
     QelFuzzCheck(built.IsEmpty() || length.empty() || length == "l", "a double is formatted without L, h, ll ...");
   }
   for (int value : {0, -1, INT_MIN, INT_MAX}) {
     built.BuildFromNum(value, format.c_str());
     QelFuzzCheck(QelUnicodeString::IsValidUtf8(built.Utf8()), "BuildFromNum gives valid UTF-8");
+    QelFuzzCheck(built.Utf8().size() <= longest, "a formatted int stays short");
     QelFuzzCheck(built.IsEmpty() || LengthModifier(format).empty(), "an int is formatted without a length modifier");
   }
 

@@ -35,8 +35,8 @@ class QelUnicodeString {
   // Formats one number with a printf format. The format must hold exactly one conversion
   // of the value's type ("%g", "%.3f", "%d", "%5x" ...; literal text and "%%" around it are
   // fine); any other format, a length modifier that does not fit the type ("%ld" for an
-  // int; only "%lf" and the like for a double), or `*` widths, is refused and leaves the
-  // text empty.
+  // int; only "%lf" and the like for a double), `*` widths, or a width or precision above
+  // 1024, is refused and leaves the text empty.
   void BuildFromNum(double value, const char* format = "%g");
   void BuildFromNum(int value, const char* format = "%d");
 

@@ -1,5 +1,6 @@
 #include "QelUnicodeString.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cmath>
 #include <cstdio>
@@ -64,6 +65,17 @@ struct PrintfConversion {
   bool otherLength = false;  // anything but one 'l' (which only a double may carry, to no effect)
 };
 
+// A width or precision beyond this is refused: "%999999999d" would build a gigabyte of
+// spaces, far past any text a person reads. "%.400f" of a huge double still fits.
+constexpr long kMaxFieldSize = 1024;
+
+// Skips a run of digits and answers its value, saturated just above kMaxFieldSize.
+long ReadDigits(const char*& p) {
+  long value = 0;
+  for (; *p >= '0' && *p <= '9'; ++p) value = std::min(value * 10 + (*p - '0'), kMaxFieldSize + 1);
+  return value;
+}
+
 PrintfConversion ParsePrintfFormat(const char* format) {
   PrintfConversion found;
   int conversions = 0;
@@ -72,10 +84,10 @@ PrintfConversion ParsePrintfFormat(const char* format) {
     ++p;
     if (*p == '%') continue;
     while (*p && std::strchr("-+ #0'", *p)) ++p;
-    while (*p >= '0' && *p <= '9') ++p;
+    if (ReadDigits(p) > kMaxFieldSize) return {};
     if (*p == '.') {
       ++p;
-      while (*p >= '0' && *p <= '9') ++p;
+      if (ReadDigits(p) > kMaxFieldSize) return {};
     }
     if (*p == '*' || *p == '$') return {};
     const char* length = p;
