@@ -6,6 +6,7 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -247,24 +248,36 @@ TEST_F(SettingRepositoryTest, ProcessKilledBeforeRenameLeavesTheOldFileIntactAnd
 }
 
 TEST_F(SettingRepositoryTest, ProcessKilledAtRandomMomentsOfSavesAlwaysLeavesAWholeFile) {
-  const std::string pad(64 * 1024, 'p');  // long enough for a kill to land inside the write
+  const std::string pad(16 * 1024, 'p');  // long enough for a kill to land inside the write
   QelSettingRepository* repo = Repo();
   repo->WriteSetting("n", 0);
   repo->WriteSetting("pad", pad.c_str());
+  // Kills are spread over about three saves, however long a save takes in this build.
+  const auto start = std::chrono::steady_clock::now();
   ASSERT_EQ(repo->SaveRepository(), S_OK);
+  const auto saveMicroseconds =
+      std::chrono::duration_cast<std::chrono::microseconds>(std::chrono::steady_clock::now() - start).count();
   std::mt19937 random(20261206);
   int lastSeen = 0;
   size_t mostTemporaries = 0;
-  for (int round = 0; round < 60; ++round) {
+  for (int round = 0; round < 50; ++round) {
+    int ready[2];
+    ASSERT_EQ(::pipe(ready), 0);
     pid_t child = ::fork();
     ASSERT_GE(child, 0);
     if (child == 0) {
+      ::close(ready[0]);
+      ::write(ready[1], "r", 1);
       for (int n = lastSeen + 1;; ++n) {
         repo->WriteSetting("n", n, 1);
         repo->SaveRepository();
       }
     }
-    ::usleep(random() % 40000);  // a save syncs twice: some 20 ms on a disk
+    ::close(ready[1]);
+    char byte;
+    ASSERT_EQ(::read(ready[0], &byte, 1), 1);
+    ::close(ready[0]);
+    ::usleep(static_cast<useconds_t>(random() % (3 * saveMicroseconds + 1)));
     ::kill(child, SIGKILL);
     int status = 0;
     ASSERT_EQ(::waitpid(child, &status, 0), child);
@@ -276,6 +289,7 @@ TEST_F(SettingRepositoryTest, ProcessKilledAtRandomMomentsOfSavesAlwaysLeavesAWh
     mostTemporaries = std::max(mostTemporaries, Temporaries().size());
   }
   EXPECT_GT(lastSeen, 0) << "the children did save";
+  EXPECT_GT(mostTemporaries, 0u) << "some kills landed inside a save";
   QelSettingRepository::ForgetRepositories();
   Repo()->WriteSetting("after", 1);
   ASSERT_EQ(Repo()->SaveRepository(), S_OK);
