@@ -1,9 +1,16 @@
 #!/usr/bin/env bash
-# Installs what the build, the tests and the benchmarks need on a Debian machine.
+# Installs what the build, the tests and the benchmarks need on a Debian machine; with
+# --fuzz also clang and libFuzzer's runtime, for the `fuzz` preset.
 # Runs apt-get only when something is missing, so it is cheap to call every time.
 set -euo pipefail
 packages=(cmake ninja-build g++ pkg-config googletest libgtest-dev libgmock-dev libbenchmark-dev
           nlohmann-json3-dev libpng-dev libedit-dev)
+for option in "$@"; do
+  case "$option" in
+    --fuzz) packages+=(clang libclang-rt-dev) ;;
+    *) echo "usage: bash tools/setup.sh [--fuzz]" >&2; exit 2 ;;
+  esac
+done
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q 'install ok installed' || missing+=("$p")

@@ -1,6 +1,7 @@
 #include "QelHostOptions.h"
 
 #include <cerrno>
+#include <cmath>
 #include <cstdlib>
 
 namespace {
@@ -9,7 +10,8 @@ bool ParseNumber(const std::string& text, double& value) {
   errno = 0;
   char* end = nullptr;
   value = std::strtod(text.c_str(), &end);
-  return errno == 0 && end == text.c_str() + text.size();
+  // strtod reads "nan" and "inf" too: a NaN bound would silently hide every annotation.
+  return errno == 0 && end == text.c_str() + text.size() && std::isfinite(value);
 }
 
 bool ParseSettingRequest(const std::string& text, QelHostOptions::SettingRequest& request) {
@@ -131,6 +133,10 @@ bool QelHostOptions::Parse(const std::vector<std::string>& args, QelHostOptions&
       options.tolerance = range;
     } else if (arg == "--module") {
       if (!value(options.modulePath)) return false;
+      if (options.modulePath.empty()) {
+        error = "option '--module' needs a file name, not an empty text";
+        return false;
+      }
     } else if (arg == "--script") {
       if (!value(options.scriptPath)) return false;
     } else if (arg == "--list-module") {
@@ -143,7 +149,11 @@ bool QelHostOptions::Parse(const std::vector<std::string>& args, QelHostOptions&
         return false;
       }
       options.settings.push_back(request);
-    } else if (!arg.empty() && arg[0] == '-') {
+    } else if (arg.empty()) {
+      // An empty model path would otherwise mean "the sample" and hide the caller's mistake.
+      error = "the model file name '' is empty";
+      return false;
+    } else if (arg[0] == '-') {
       error = "unknown option '" + arg + "'";
       return false;
     } else if (!options.modelPath.empty()) {

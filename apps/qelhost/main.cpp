@@ -48,6 +48,12 @@ bool HandleSettings(const std::vector<QelHostOptions::SettingRequest>& requests)
         continue;
       }
     }
+    if (repository->IsFileUnusable()) {
+      std::fprintf(stderr, "qelhost: %s/%s cannot be read: the settings file %s is not usable (see above)\n",
+                   request.repository.c_str(), key, repository->GetFilePath().c_str());
+      ok = false;
+      continue;
+    }
     int number = 0;
     QelString text;
     if (repository->ReadSetting(key, number) == S_OK)

@@ -32,6 +32,9 @@ TEST(QelHostOptionsTest, RefusalsNameTheArgument) {
       {{"--tolerance", "0.1"}, "'0.1'"},
       {{"--setting", "novalue"}, "'novalue'"},
       {{"--setting", "repo/"}, "'repo/'"},
+      {{"--hide", "x", ""}, "model file name '' is empty"},
+      {{"--module", ""}, "'--module'"},
+      {{"--tolerance", "t<nan"}, "'t<nan'"},
   };
   for (const auto& c : cases) {
     QelHostOptions options;
@@ -79,7 +82,8 @@ TEST(QelHostOptionsTest, ToleranceRangesBecomeTheFilterOperators) {
 
 TEST(QelHostOptionsTest, MalformedToleranceRangesAreRefused) {
   for (const char* text : {"", "t", "0.1", "t<", "x<t", "0.1<t<", "t>0.1", "0.1<=t=0.2", "t=0.1<0.2", "0.1<t<0.2t",
-                           "tt", "0.1<t<abc", "1e999<t"}) {
+                           "tt", "0.1<t<abc", "1e999<t", "t<nan", "nan<t", "t=inf", "-inf<=t<=inf",
+                           "t<NAN(1)"}) {
     QelToleranceRange range;
     std::string error;
     EXPECT_FALSE(QelHostOptions::ParseToleranceRange(text, range, error)) << text;

@@ -62,19 +62,23 @@ TEST(QelUnicodeStringBuildFromNum, FormatsOneNumberOfTheRightType) {
   EXPECT_EQ(text.Utf8(), "42");
   text.BuildFromNum(255, "%%%04X");
   EXPECT_EQ(text.Utf8(), "%00FF");
+  text.BuildFromNum(0.5, "%lf");  // 'l' has no effect on a double's conversion
+  EXPECT_EQ(text.Utf8(), "0.500000");
   text.BuildFromNum(1e300, "%.400f");  // far longer than any fixed buffer
   EXPECT_EQ(text.GetLengthInChar(), 301 + 1 + 400);
 }
 
 TEST(QelUnicodeStringBuildFromNum, RefusedFormatLeavesTheTextEmpty) {
-  for (const char* format : {"%d", "%s", "%f %f", "%*f", "%.*f", "no conversion", "%Lf", "%n", "%", "%1$f"}) {
+  for (const char* format : {"%d", "%s", "%f %f", "%*f", "%.*f", "no conversion", "%Lf", "%n", "%", "%1$f", "%.1025f", "%999999999f"}) {
     QelUnicodeString text("previous");
     text.BuildFromNum(1.5, format);
     EXPECT_TRUE(text.IsEmpty()) << format;
   }
-  for (const char* format : {"%f", "%s", "%lld", "%hd", "%d%d", "%p"}) {
+  // A length modifier would make printf read a wider argument than the int passed.
+  for (const char* format : {"%f", "%s", "%lld", "%hd", "%d%d", "%p", "%ld", "%lx", "%lu", "%li", "%zd", "%jd", "%1025d",
+                             "%99999999999999999999999d"}) {
     QelUnicodeString text("previous");
-    text.BuildFromNum(7, format);
+    text.BuildFromNum(-1, format);
     EXPECT_TRUE(text.IsEmpty()) << format;
   }
   QelUnicodeString text("previous");
@@ -95,7 +99,8 @@ TEST(QelUnicodeStringConvertToNum, ReadsOneWholeNumber) {
 }
 
 TEST(QelUnicodeStringConvertToNum, FailureAnswersZeroAndKeepsTheValue) {
-  for (const char* text : {"", "   ", "abc", "1.5mm", "1.5 2.5", "1e999", "-1e999"}) {
+  for (const char* text : {"", "   ", "abc", "1.5mm", "1.5 2.5", "1e999", "-1e999", "nan", "-inf", "INFINITY",
+                           "nan(0x1)"}) {
     double value = 7;
     EXPECT_EQ(QelUnicodeString(text).ConvertToNum(&value, "%le"), 0) << text;
     EXPECT_EQ(value, 7) << text;

@@ -1,16 +1,22 @@
 #include "QelSettingRepository.h"
 
 #include <gtest/gtest.h>
+#include <signal.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
+#include <algorithm>
+#include <chrono>
 #include <cstdio>
 #include <cstdlib>
+#include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <nlohmann/json.hpp>
+#include <random>
 #include <sstream>
 
+#include "QelAtomicFile.h"
 #include "QelCallbackManager.h"
 #include "QelSettingNotif.h"
 
@@ -39,7 +45,7 @@ class SettingRepositoryTest : public ::testing::Test {
     liveBefore_ = QelBaseUnknown::LiveObjectCount();
   }
   void TearDown() override {
-    QelSettingRepository::SetBeforeRenameHookForTesting({});
+    QelAtomicFile::SetFaultHookForTesting({});
     QelSettingRepository::ForgetRepositories();
     EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), liveBefore_);
     fs::remove_all(folder_);
@@ -51,8 +57,10 @@ class SettingRepositoryTest : public ::testing::Test {
   fs::path FileOf(const char* name = "QelRovDataFiltering") { return fs::path(folder_) / (std::string(name) + ".json"); }
 
   // Runs the probe as a new process: what another program sees in the file.
-  std::string Probe(const char* key, const char* type, const char* name = "QelRovDataFiltering") {
-    std::string command = std::string(QEL_SETTINGS_PROBE) + " " + folder_ + " " + name + " " + key + " " + type;
+  std::string Probe(const char* key, const char* type, const char* name = "QelRovDataFiltering",
+                    const char* save = "") {
+    std::string command =
+        std::string(QEL_SETTINGS_PROBE) + " " + folder_ + " " + name + " " + key + " " + type + " " + save + " 2>&1";
     FILE* pipe = ::popen(command.c_str(), "r");
     if (!pipe) return "popen failed";
     std::string out;
@@ -61,6 +69,14 @@ class SettingRepositoryTest : public ::testing::Test {
     ::pclose(pipe);
     if (!out.empty() && out.back() == '\n') out.pop_back();
     return out;
+  }
+
+  std::vector<std::string> Temporaries() {
+    std::vector<std::string> found;
+    for (const auto& entry : fs::directory_iterator(folder_))
+      if (entry.path().filename().string().find(".tmp-") != std::string::npos)
+        found.push_back(entry.path().filename().string());
+    return found;
   }
 
   std::string folder_;
@@ -169,44 +185,155 @@ TEST_F(SettingRepositoryTest, HugeIntegersInAHandEditedFileDoNotReadAsInt) {
   EXPECT_EQ(value, -3);
 }
 
-TEST_F(SettingRepositoryTest, CrashBetweenWriteAndRenameLeavesTheOldFileIntact) {
+TEST_F(SettingRepositoryTest, EveryFailingStepOfASaveIsReportedWithItsOwnReasonAndLeavesNoTemporary) {
+  using Step = QelAtomicFile::Step;
   QelSettingRepository* repo = Repo();
-  repo->WriteSetting("DataFilteringPanel_LumReview", 1);
+  repo->WriteSetting("v", 1);
   ASSERT_EQ(repo->SaveRepository(), S_OK);
   const std::string before = ReadFile(FileOf());
-
-  repo->WriteSetting("DataFilteringPanel_LumReview", 0);
-  QelSettingRepository::SetBeforeRenameHookForTesting([] { return false; });
-  EXPECT_EQ(repo->SaveRepository(), E_FAIL);
-  EXPECT_EQ(ReadFile(FileOf()), before);
-  EXPECT_EQ(Probe("DataFilteringPanel_LumReview", "int"), "1");
-  EXPECT_TRUE(repo->IsModified()) << "the change is still pending";
-
-  QelSettingRepository::SetBeforeRenameHookForTesting({});
-  EXPECT_EQ(repo->SaveRepository(), S_OK) << "a later save overwrites the stale temporary";
-  EXPECT_EQ(Probe("DataFilteringPanel_LumReview", "int"), "0");
+  for (Step failing : {Step::Create, Step::Write, Step::Sync, Step::Close, Step::Rename, Step::SyncFolder}) {
+    SCOPED_TRACE(static_cast<int>(failing));
+    repo->WriteSetting("v", 2);
+    QelAtomicFile::SetFaultHookForTesting([failing](Step step) { return step == failing ? EIO : 0; });
+    testing::internal::CaptureStderr();
+    EXPECT_EQ(repo->SaveRepository(), E_FAIL);
+    const std::string report = testing::internal::GetCapturedStderr();
+    EXPECT_NE(report.find(std::strerror(EIO)), std::string::npos) << report;
+    EXPECT_EQ(report.find("Success"), std::string::npos) << report;
+    EXPECT_TRUE(repo->IsModified()) << "the change is still pending";
+    EXPECT_TRUE(Temporaries().empty());
+    if (failing != Step::SyncFolder) {
+      EXPECT_EQ(ReadFile(FileOf()), before) << "the old file is untouched";
+    }
+    QelAtomicFile::SetFaultHookForTesting({});
+    ASSERT_EQ(repo->WriteSetting("v", 1), S_OK);
+    ASSERT_EQ(repo->SaveRepository(), S_OK) << "the next save goes through";
+  }
 }
 
-TEST_F(SettingRepositoryTest, ProcessKilledBeforeRenameLeavesTheOldFileIntact) {
+TEST_F(SettingRepositoryTest, ProcessKilledBeforeRenameLeavesTheOldFileIntactAndTheNextSaveClearsItsTemporary) {
   QelSettingRepository* repo = Repo();
   repo->WriteSetting("v", 1);
   ASSERT_EQ(repo->SaveRepository(), S_OK);
   const std::string before = ReadFile(FileOf());
 
-  pid_t child = ::fork();
-  ASSERT_GE(child, 0);
-  if (child == 0) {
-    QelSettingRepository::SetBeforeRenameHookForTesting([]() -> bool { ::_exit(42); });
-    repo->WriteSetting("v", 2, 1);
-    repo->SaveRepository();
-    ::_exit(0);
+  for (int crash = 0; crash < 2; ++crash) {
+    pid_t child = ::fork();
+    ASSERT_GE(child, 0);
+    if (child == 0) {
+      QelAtomicFile::SetFaultHookForTesting([](QelAtomicFile::Step step) {
+        if (step == QelAtomicFile::Step::Rename) ::_exit(42);
+        return 0;
+      });
+      repo->WriteSetting("v", 2, 1);
+      repo->SaveRepository();
+      ::_exit(0);
+    }
+    int status = 0;
+    ASSERT_EQ(::waitpid(child, &status, 0), child);
+    ASSERT_TRUE(WIFEXITED(status));
+    EXPECT_EQ(WEXITSTATUS(status), 42) << "the child died inside the save";
   }
-  int status = 0;
-  ASSERT_EQ(::waitpid(child, &status, 0), child);
-  ASSERT_TRUE(WIFEXITED(status));
-  EXPECT_EQ(WEXITSTATUS(status), 42) << "the child died inside the save";
   EXPECT_EQ(ReadFile(FileOf()), before);
   EXPECT_EQ(Probe("v", "int"), "1");
+  EXPECT_EQ(Temporaries().size(), 1u) << "the second save cleared the first crash's temporary";
+
+  // A temporary of a process that still runs may be a save in progress: it stays.
+  const std::string live = FileOf().string() + ".tmp-" + std::to_string(::getppid()) + "-abcdef";
+  WriteFile(live, "{}");
+  repo->WriteSetting("v", 3);
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_EQ(Temporaries(), std::vector<std::string>{fs::path(live).filename().string()});
+  EXPECT_EQ(Probe("v", "int"), "3");
+}
+
+TEST_F(SettingRepositoryTest, ProcessKilledAtRandomMomentsOfSavesAlwaysLeavesAWholeFile) {
+  const std::string pad(16 * 1024, 'p');  // long enough for a kill to land inside the write
+  QelSettingRepository* repo = Repo();
+  repo->WriteSetting("n", 0);
+  repo->WriteSetting("pad", pad.c_str());
+  // Kills are spread over about three saves, however long a save takes in this build.
+  const auto start = std::chrono::steady_clock::now();
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  const auto saveMicroseconds =
+      std::chrono::duration_cast<std::chrono::microseconds>(std::chrono::steady_clock::now() - start).count();
+  std::mt19937 random(20261206);
+  int lastSeen = 0;
+  size_t mostTemporaries = 0;
+  for (int round = 0; round < 50; ++round) {
+    int ready[2];
+    ASSERT_EQ(::pipe(ready), 0);
+    pid_t child = ::fork();
+    ASSERT_GE(child, 0);
+    if (child == 0) {
+      ::close(ready[0]);
+      ::write(ready[1], "r", 1);
+      for (int n = lastSeen + 1;; ++n) {
+        repo->WriteSetting("n", n, 1);
+        repo->SaveRepository();
+      }
+    }
+    ::close(ready[1]);
+    char byte;
+    ASSERT_EQ(::read(ready[0], &byte, 1), 1);
+    ::close(ready[0]);
+    ::usleep(static_cast<useconds_t>(random() % (3 * saveMicroseconds + 1)));
+    ::kill(child, SIGKILL);
+    int status = 0;
+    ASSERT_EQ(::waitpid(child, &status, 0), child);
+    nlohmann::json saved = nlohmann::json::parse(ReadFile(FileOf()), nullptr, false);
+    ASSERT_TRUE(saved.is_object()) << "round " << round << ": " << ReadFile(FileOf()).substr(0, 200);
+    ASSERT_EQ(saved.value("pad", ""), pad) << "round " << round;
+    ASSERT_GE(saved.value("n", -1), lastSeen) << "round " << round;
+    lastSeen = saved.value("n", -1);
+    mostTemporaries = std::max(mostTemporaries, Temporaries().size());
+  }
+  EXPECT_GT(lastSeen, 0) << "the children did save";
+  EXPECT_GT(mostTemporaries, 0u) << "some kills landed inside a save";
+  QelSettingRepository::ForgetRepositories();
+  Repo()->WriteSetting("after", 1);
+  ASSERT_EQ(Repo()->SaveRepository(), S_OK);
+  EXPECT_TRUE(Temporaries().empty()) << "up to " << mostTemporaries << " temporaries were left by the kills";
+  EXPECT_EQ(Probe("n", "int"), std::to_string(lastSeen));
+}
+
+TEST_F(SettingRepositoryTest, SaveKeepsWhatAnotherProcessSavedMeanwhile) {
+  QelSettingRepository* repo = Repo();
+  repo->WriteSetting("gone", 1);
+  repo->WriteSetting("mine", 1);
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_EQ(Probe("theirs", "int", "QelRovDataFiltering", "7"), "7");
+  repo->WriteSetting("mine", 2);
+  repo->RemoveSetting("gone");
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_EQ(Probe("theirs", "int"), "7");
+  EXPECT_EQ(Probe("mine", "int"), "2");
+  EXPECT_EQ(Probe("gone", "int"), "absent");
+  int theirs = 0;
+  EXPECT_EQ(repo->ReadSetting("theirs", theirs), S_OK) << "the save also refreshed this process's copy";
+  EXPECT_EQ(theirs, 7);
+}
+
+TEST_F(SettingRepositoryTest, NumberOutOfRangeMakesTheFileCorruptAndItIsSetAsideWhole) {
+  const std::string original = R"({"keep": 5, "x": 1e400})";
+  WriteFile(FileOf(), original);
+  testing::internal::CaptureStderr();
+  QelSettingRepository* repo = Repo();
+  int value = -1;
+  EXPECT_FALSE(repo->IsPresent("keep", "int"));
+  EXPECT_EQ(repo->ReadSetting("keep", value), E_FAIL);
+  EXPECT_TRUE(repo->IsFileUnusable());
+  const std::string report = testing::internal::GetCapturedStderr();
+  EXPECT_NE(report.find(FileOf().string()), std::string::npos) << report;
+  EXPECT_NE(Probe("keep", "int").find("absent"), std::string::npos) << "another process does not abort on it either";
+
+  repo->WriteSetting("new", 1);
+  testing::internal::CaptureStderr();
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_NE(testing::internal::GetCapturedStderr().find(".corrupt-1"), std::string::npos);
+  EXPECT_EQ(ReadFile(FileOf().string() + ".corrupt-1"), original) << "the user's settings can be recovered";
+  EXPECT_EQ(Probe("new", "int"), "1");
+  EXPECT_FALSE(repo->IsFileUnusable());
 }
 
 TEST_F(SettingRepositoryTest, CorruptFileIsReportedReadsEmptyAndIsSetAsideNotOverwritten) {

@@ -27,4 +27,7 @@ class QelMsgCatalog {
   static std::vector<QelString> ListKeys(const char* catalog);
   // The folder the catalogs are read from, as it is resolved right now.
   static std::string CatalogFolder();
+  // Drops every parsed catalog, so the next look-up reads the files again. Texts already
+  // built stay valid; for a host whose resources changed, and for tests.
+  static void ForgetCatalogs();
 };

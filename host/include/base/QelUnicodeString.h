@@ -34,7 +34,9 @@ class QelUnicodeString {
 
   // Formats one number with a printf format. The format must hold exactly one conversion
   // of the value's type ("%g", "%.3f", "%d", "%5x" ...; literal text and "%%" around it are
-  // fine); any other format, or `*` widths, is refused and leaves the text empty.
+  // fine); any other format, a length modifier that does not fit the type ("%ld" for an
+  // int; only "%lf" and the like for a double), `*` widths, or a width or precision above
+  // 1024, is refused and leaves the text empty.
   void BuildFromNum(double value, const char* format = "%g");
   void BuildFromNum(int value, const char* format = "%d");
 
@@ -42,7 +44,7 @@ class QelUnicodeString {
   // ("%lf", "%le", "%lg", "%la", optional width; literal text around it must match).
   // Returns 1 when the whole text was read (leading and trailing blanks allowed), else 0:
   // an empty text, text that is not a number, characters left after the number ("1.5mm"),
-  // a value out of the range of double, or a refused format. On 0, *out is not touched,
+  // a value out of the range of double, "nan" or "inf", or a refused format. On 0, *out is not touched,
   // so a caller that ignores the status keeps its previous value.
   int ConvertToNum(double* out, const char* format = "%lf") const;
 

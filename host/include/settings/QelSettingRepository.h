@@ -8,7 +8,6 @@
 //   QelSettingRepository* repo = QelSettingRepository::GetRepository("QelRovDataFiltering");
 //   int on = 0;
 //   if (repo && repo->IsPresent("DataFilteringPanel_TPSCfg", "int")) repo->ReadSetting("DataFilteringPanel_TPSCfg", on);
-#include <functional>
 #include <memory>
 #include <string>
 
@@ -30,12 +29,6 @@ class QelSettingRepository : public QelBaseUnknown {
   // Drops every repository; unsaved changes are lost and pointers lent before dangle. For a
   // host that shuts down, and for tests that need a fresh read of the files.
   static void ForgetRepositories();
-
-  // Simulates a crash in SaveRepository after the temporary file is written and synced and
-  // before it is renamed over the old one: the hook runs there, and when it returns false
-  // the save stops as if the process had died (the old file and the temporary remain).
-  // A hook may also end the process itself. An empty function removes the hook.
-  static void SetBeforeRenameHookForTesting(std::function<bool()> hook);
 
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override { return &MetaObject(); }
@@ -73,11 +66,18 @@ class QelSettingRepository : public QelBaseUnknown {
   HRESULT RemoveSetting(const char* key, int silent = 0);
 
   // Writes the settings to `path` (null: the repository's own file) when they were changed
-  // since the last save; S_OK also when there was nothing to write. A corrupt file found at
-  // load is first moved aside to <file>.corrupt-<n>. E_FAIL, with a logged reason, when the
-  // file cannot be written; the old file is then left as it was.
+  // since the last save; S_OK also when there was nothing to write. The own file is read
+  // again first and only this process's changes are applied to it, so settings another
+  // process saved meanwhile are kept; a file that is then corrupt is moved aside to
+  // <file>.corrupt-<n>, one that cannot be read is left alone and the save fails. E_FAIL,
+  // with a logged reason, whenever any step of the write fails (the old file is then left
+  // as it was, except after a failed folder sync, when the new file is in place but may
+  // not survive a power cut). Temporaries left by a process killed mid-save are removed.
   HRESULT SaveRepository(const char* path = nullptr);
   bool IsModified() const;
+  // True when the file exists but its settings could not be read (not a settings file, or
+  // not readable): reads then answer as for an empty repository. Reported once, at load.
+  bool IsFileUnusable();
 
  protected:
   QelSettingRepository(const QelString& name, std::string folder);

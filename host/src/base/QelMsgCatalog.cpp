@@ -190,6 +190,8 @@ std::string QelMsgCatalog::CatalogFolder() {
   return resources + "/catalogs";
 }
 
+void QelMsgCatalog::ForgetCatalogs() { Cache().clear(); }
+
 QelUnicodeString QelMsgCatalog::BuildMessage(const char* catalog, const char* key,
                                              const std::vector<QelUnicodeString>& params,
                                              const QelUnicodeString& defaultText) {

@@ -1,5 +1,6 @@
 #include "QelUnicodeString.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cmath>
 #include <cstdio>
@@ -60,9 +61,20 @@ std::string Sanitized(std::string_view bytes) {
 struct PrintfConversion {
   bool ok = false;
   char type = 0;
-  bool lengthL = false;      // 'L' (long double), never accepted
-  bool otherLength = false;  // h, hh, j, z, t, ll: change the argument's type
+  bool anyLength = false;    // any length modifier at all
+  bool otherLength = false;  // anything but one 'l' (which only a double may carry, to no effect)
 };
+
+// A width or precision beyond this is refused: "%999999999d" would build a gigabyte of
+// spaces, far past any text a person reads. "%.400f" of a huge double still fits.
+constexpr long kMaxFieldSize = 1024;
+
+// Skips a run of digits and answers its value, saturated just above kMaxFieldSize.
+long ReadDigits(const char*& p) {
+  long value = 0;
+  for (; *p >= '0' && *p <= '9'; ++p) value = std::min(value * 10 + (*p - '0'), kMaxFieldSize + 1);
+  return value;
+}
 
 PrintfConversion ParsePrintfFormat(const char* format) {
   PrintfConversion found;
@@ -72,22 +84,19 @@ PrintfConversion ParsePrintfFormat(const char* format) {
     ++p;
     if (*p == '%') continue;
     while (*p && std::strchr("-+ #0'", *p)) ++p;
-    while (*p >= '0' && *p <= '9') ++p;
+    if (ReadDigits(p) > kMaxFieldSize) return {};
     if (*p == '.') {
       ++p;
-      while (*p >= '0' && *p <= '9') ++p;
+      if (ReadDigits(p) > kMaxFieldSize) return {};
     }
     if (*p == '*' || *p == '$') return {};
-    bool lengthL = false, otherLength = false;
-    while (*p && std::strchr("hljztL", *p)) {
-      if (*p == 'L') lengthL = true;
-      else if (*p != 'l') otherLength = true;
-      else if (p[1] == 'l') otherLength = true;
-      ++p;
-    }
+    const char* length = p;
+    while (*p && std::strchr("hljztL", *p)) ++p;
+    const bool anyLength = p != length;
+    const bool otherLength = anyLength && !(p - length == 1 && *length == 'l');
     if (!*p || !std::strchr("diouxXeEfFgGaAcspn", *p)) return {};
     if (++conversions > 1) return {};
-    found = {true, *p, lengthL, otherLength};
+    found = {true, *p, anyLength, otherLength};
   }
   return conversions == 1 ? found : PrintfConversion{};
 }
@@ -165,7 +174,7 @@ void QelUnicodeString::BuildFromNum(double value, const char* format) {
   text_.clear();
   if (!format) return;
   PrintfConversion conversion = ParsePrintfFormat(format);
-  if (!conversion.ok || conversion.lengthL || conversion.otherLength) return;
+  if (!conversion.ok || conversion.otherLength) return;
   if (!std::strchr("eEfFgGaA", conversion.type)) return;
   text_ = Sanitized(FormatOne(format, value));
 }
@@ -174,7 +183,8 @@ void QelUnicodeString::BuildFromNum(int value, const char* format) {
   text_.clear();
   if (!format) return;
   PrintfConversion conversion = ParsePrintfFormat(format);
-  if (!conversion.ok || conversion.lengthL || conversion.otherLength) return;
+  // An int takes no length modifier: "%ld" would read a long the caller never passed.
+  if (!conversion.ok || conversion.anyLength) return;
   if (!std::strchr("diouxX", conversion.type)) return;
   text_ = Sanitized(FormatOne(format, value));
 }
@@ -209,7 +219,8 @@ int QelUnicodeString::ConvertToNum(double* out, const char* format) const {
     errno = 0;
     value = std::strtod(field.c_str(), &end);
     if (end == field.c_str()) return 0;
-    if (errno == ERANGE && std::isinf(value)) return 0;
+    // strtod also reads "nan" and "inf"; no caller can compare or store those sensibly.
+    if (!std::isfinite(value)) return 0;
     text += end - field.c_str();
     converted = true;
   }

@@ -1,19 +1,19 @@
 #include "QelSettingRepository.h"
 
-#include <fcntl.h>
-#include <unistd.h>
-
 #include <cerrno>
 #include <climits>
 #include <cmath>
+#include <cstdio>
 #include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <map>
+#include <optional>
 #include <nlohmann/json.hpp>
 #include <sstream>
 
 #include "QelAssert.h"
+#include "QelAtomicFile.h"
 #include "QelCallbackManager.h"
 #include "QelMetaObject.h"
 #include "QelSettingNotif.h"
@@ -29,11 +29,6 @@ namespace {
 std::map<std::string, QelSettingRepository*>& Registry() {
   static auto* registry = new std::map<std::string, QelSettingRepository*>;
   return *registry;
-}
-
-std::function<bool()>& BeforeRenameHook() {
-  static auto* hook = new std::function<bool()>;
-  return *hook;
 }
 
 void LogError(const std::string& text) { QelSysLogError((text + "\n").c_str()); }
@@ -84,19 +79,51 @@ bool AsDouble(const json& v, double& out) {
   return true;
 }
 
-bool WriteAll(int fd, const std::string& text) {
-  const char* p = text.data();
-  size_t left = text.size();
-  while (left > 0) {
-    ssize_t n = ::write(fd, p, left);
-    if (n < 0) {
-      if (errno == EINTR) continue;
-      return false;
-    }
-    p += n;
-    left -= static_cast<size_t>(n);
+enum class FileState { Missing, Settings, Corrupt, Unreadable };
+
+// Reads a settings file into `out` (an object whose values all have a setting's shape).
+// Anything else is Corrupt or Unreadable, with `problem` saying what and where.
+FileState ReadSettingsFile(const std::string& path, json& out, std::string& problem) {
+  out = json::object();
+  std::error_code ec;
+  if (!fs::exists(path, ec)) {
+    if (!ec) return FileState::Missing;
+    problem = "cannot be reached (" + ec.message() + ")";
+    return FileState::Unreadable;
   }
-  return true;
+  std::ifstream in(path, std::ios::binary);
+  std::ostringstream text;
+  text << in.rdbuf();
+  if (!in || in.bad()) {
+    problem = std::string("cannot be read (") + std::strerror(errno) + ")";
+    return FileState::Unreadable;
+  }
+  // An empty file is what `touch` leaves; it holds no settings and nothing to keep.
+  if (text.str().find_first_not_of(" \t\r\n") == std::string::npos) return FileState::Settings;
+  json parsed;
+  try {
+    parsed = json::parse(text.str());
+  } catch (const json::parse_error& e) {
+    problem = "is not valid JSON (at byte " + std::to_string(e.byte) + ": " + e.what() + ")";
+    return FileState::Corrupt;
+  } catch (const json::exception& e) {
+    // A number beyond the range of double ("1e400") ends up here, not as a parse error.
+    problem = std::string("holds a value that cannot be read (") + e.what() + ")";
+    return FileState::Corrupt;
+  }
+  if (!parsed.is_object()) {
+    problem = std::string("is not a settings file: the top level must be a JSON object, not ") + parsed.type_name();
+    return FileState::Corrupt;
+  }
+  for (const auto& [key, value] : parsed.items()) {
+    std::string why = ShapeError(value);
+    if (!why.empty()) {
+      problem = "at " + JsonPointer(key) + ": " + why;
+      return FileState::Corrupt;
+    }
+  }
+  out = std::move(parsed);
+  return FileState::Settings;
 }
 
 // Reads exactly `count` values of a setting (a single value counts as an array of one);
@@ -120,67 +147,40 @@ struct QelSettingRepository::State {
   QelString name;
   std::string path;
   json values = json::object();
+  // What this process wrote (a value) or removed (nullopt) since its last save. A save
+  // applies these to the file as it is then, so settings another process saved meanwhile
+  // are kept rather than replaced by this process's older copy.
+  std::map<std::string, std::optional<json>> changes;
   bool loaded = false;
   bool modified = false;
-  // The file holds something that is not a settings file: it is moved aside, never
-  // overwritten, so whatever the user had there can still be recovered by hand.
-  bool corrupt = false;
-  // The file exists but could not be read: saving would replace settings never seen.
-  bool unreadable = false;
+  // The file exists but its settings could not be read (reported once, at load).
+  bool unusable = false;
 
   void Load();
   const json* Find(const char* key);
   HRESULT Store(const char* key, json value, int silent);
   HRESULT MoveCorruptFileAside();
+  HRESULT SaveOwnFile();
 };
 
 void QelSettingRepository::State::Load() {
   if (loaded) return;
   loaded = true;
-  std::error_code ec;
-  if (!fs::exists(path, ec)) {
-    if (ec) {
-      unreadable = true;
-      LogError("qel: settings file '" + path + "' cannot be reached (" + ec.message() + "); its settings are ignored");
-    }
-    return;
-  }
-  std::ifstream in(path, std::ios::binary);
-  std::ostringstream text;
-  text << in.rdbuf();
-  if (!in || in.bad()) {
-    unreadable = true;
-    LogError("qel: settings file '" + path + "' cannot be read (" + std::strerror(errno) +
-             "); its settings are ignored and it will not be overwritten");
-    return;
-  }
-  // An empty file is what `touch` leaves; it holds no settings and nothing to keep.
-  if (text.str().find_first_not_of(" \t\r\n") == std::string::npos) return;
-  const std::string aside = "; its settings are ignored and the file will be set aside at the next save";
-  json parsed;
-  try {
-    parsed = json::parse(text.str());
-  } catch (const json::parse_error& e) {
-    corrupt = true;
-    LogError("qel: settings file '" + path + "' is not valid JSON (at byte " + std::to_string(e.byte) + ": " +
-             e.what() + ")" + aside);
-    return;
-  }
-  if (!parsed.is_object()) {
-    corrupt = true;
-    LogError("qel: settings file '" + path + "': the top level must be a JSON object, not " + parsed.type_name() +
-             aside);
-    return;
-  }
-  for (const auto& [key, value] : parsed.items()) {
-    std::string why = ShapeError(value);
-    if (!why.empty()) {
-      corrupt = true;
-      LogError("qel: settings file '" + path + "' at " + JsonPointer(key) + ": " + why + aside);
+  std::string problem;
+  switch (ReadSettingsFile(path, values, problem)) {
+    case FileState::Missing:
+    case FileState::Settings:
       return;
-    }
+    case FileState::Corrupt:
+      unusable = true;
+      LogError("qel: settings file '" + path + "' " + problem +
+               "; its settings are ignored and the file will be set aside at the next save");
+      return;
+    case FileState::Unreadable:
+      unusable = true;
+      LogError("qel: settings file '" + path + "' " + problem + "; its settings are ignored and it will not be overwritten");
+      return;
   }
-  values = std::move(parsed);
 }
 
 const json* QelSettingRepository::State::Find(const char* key) {
@@ -196,7 +196,8 @@ HRESULT QelSettingRepository::State::Store(const char* key, json value, int sile
     // Texts that JSON cannot hold (bad UTF-8) are refused now rather than failing the save.
     (void)json{{key, value}}.dump();
     Load();
-    values[key] = std::move(value);
+    values[key] = value;
+    changes[key] = std::move(value);
   } catch (const std::exception&) {
     return E_FAIL;
   }
@@ -219,7 +220,6 @@ HRESULT QelSettingRepository::State::MoveCorruptFileAside() {
       return E_FAIL;
     }
     LogError("qel: the corrupt settings file '" + path + "' was kept as '" + aside + "'");
-    corrupt = false;
     return S_OK;
   }
   LogError("qel: settings not saved: too many corrupt copies of '" + path + "'");
@@ -280,13 +280,14 @@ void QelSettingRepository::ForgetRepositories() {
   for (auto& [id, repository] : registry) repository->Release();
 }
 
-void QelSettingRepository::SetBeforeRenameHookForTesting(std::function<bool()> hook) {
-  BeforeRenameHook() = std::move(hook);
-}
-
 const QelString& QelSettingRepository::GetName() const { return state_->name; }
 const std::string& QelSettingRepository::GetFilePath() const { return state_->path; }
 bool QelSettingRepository::IsModified() const { return state_->modified; }
+
+bool QelSettingRepository::IsFileUnusable() {
+  state_->Load();
+  return state_->unusable;
+}
 
 int QelSettingRepository::IsPresent(const char* key, const char* type) {
   const json* v = state_->Find(key);
@@ -378,6 +379,7 @@ HRESULT QelSettingRepository::WriteSetting(const char* key, const double* values
 HRESULT QelSettingRepository::RemoveSetting(const char* key, int silent) {
   if (!state_->Find(key)) return S_FALSE;
   state_->values.erase(key);
+  state_->changes[key] = std::nullopt;
   state_->modified = true;
   if (!silent) {
     auto notification = QelMakeVar<QelSettingNotif>(QelString(key));
@@ -386,59 +388,61 @@ HRESULT QelSettingRepository::RemoveSetting(const char* key, int silent) {
   return S_OK;
 }
 
+namespace {
+// Writes `text` over `target` in one step; false with the reason logged.
+bool WriteAtomically(const std::string& target, const std::string& text) {
+  std::error_code ec;
+  fs::path folder = fs::path(target).parent_path();
+  if (!folder.empty()) fs::create_directories(folder, ec);
+  if (ec) {
+    LogError("qel: settings not saved: the folder '" + folder.string() + "' cannot be made (" + ec.message() + ")");
+    return false;
+  }
+  QelAtomicFile::RemoveStaleTemporaries(target);
+  std::string error;
+  auto file = QelAtomicFile::Create(target, error);
+  if (!file || !file->Write(text, error) || !file->Keep(error)) {
+    LogError("qel: settings not saved to '" + target + "': " + error);
+    return false;
+  }
+  return true;
+}
+}  // namespace
+
+HRESULT QelSettingRepository::State::SaveOwnFile() {
+  json current;
+  std::string problem;
+  switch (ReadSettingsFile(path, current, problem)) {
+    case FileState::Unreadable:
+      LogError("qel: settings not saved: '" + path + "' " + problem + ", and saving would replace it");
+      return E_FAIL;
+    case FileState::Corrupt:
+      if (!unusable) LogError("qel: settings file '" + path + "' " + problem);
+      if (MoveCorruptFileAside() != S_OK) return E_FAIL;
+      break;
+    case FileState::Missing:
+    case FileState::Settings:
+      break;
+  }
+  for (const auto& [key, value] : changes) {
+    if (value) current[key] = *value;
+    else current.erase(key);
+  }
+  if (!WriteAtomically(path, current.dump(2) + "\n")) return E_FAIL;
+  values = std::move(current);
+  changes.clear();
+  modified = false;
+  unusable = false;
+  return S_OK;
+}
+
 HRESULT QelSettingRepository::SaveRepository(const char* path) {
   State& s = *state_;
   try {
     s.Load();
     const std::string target = path && *path ? std::string(path) : s.path;
-    const bool own = target == s.path;
-    if (own && !s.modified) return S_OK;
-    if (own && s.unreadable) {
-      LogError("qel: settings not saved: '" + target + "' could not be read, and saving would replace it");
-      return E_FAIL;
-    }
-    std::error_code ec;
-    fs::path folder = fs::path(target).parent_path();
-    if (!folder.empty()) fs::create_directories(folder, ec);
-    if (ec) {
-      LogError("qel: settings not saved: the folder '" + folder.string() + "' cannot be made (" + ec.message() + ")");
-      return E_FAIL;
-    }
-    if (own && s.corrupt && s.MoveCorruptFileAside() != S_OK) return E_FAIL;
-
-    const std::string text = s.values.dump(2) + "\n";
-    // The temporary sits in the target's folder so that the rename stays on one file system
-    // and therefore replaces the old file in one step.
-    const std::string temporary = target + ".tmp-" + std::to_string(::getpid());
-    int fd = ::open(temporary.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, 0644);
-    if (fd < 0) {
-      LogError("qel: settings not saved: '" + temporary + "' cannot be created (" + std::strerror(errno) + ")");
-      return E_FAIL;
-    }
-    bool written = WriteAll(fd, text) && ::fsync(fd) == 0;
-    int writeErrno = errno;
-    written = ::close(fd) == 0 && written;
-    if (!written) {
-      ::unlink(temporary.c_str());
-      LogError("qel: settings not saved: writing '" + temporary + "' failed (" + std::strerror(writeErrno) + ")");
-      return E_FAIL;
-    }
-    if (auto& hook = BeforeRenameHook(); hook && !hook()) return E_FAIL;
-    if (::rename(temporary.c_str(), target.c_str()) != 0) {
-      int renameErrno = errno;
-      ::unlink(temporary.c_str());
-      LogError("qel: settings not saved: '" + temporary + "' could not replace '" + target + "' (" +
-               std::strerror(renameErrno) + ")");
-      return E_FAIL;
-    }
-    // Without syncing the folder the rename itself could be lost in a power cut.
-    int dirFd = ::open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC);
-    if (dirFd >= 0) {
-      ::fsync(dirFd);
-      ::close(dirFd);
-    }
-    if (own) s.modified = false;
-    return S_OK;
+    if (target == s.path) return s.modified ? s.SaveOwnFile() : S_OK;
+    return WriteAtomically(target, s.values.dump(2) + "\n") ? S_OK : E_FAIL;
   } catch (const std::exception& e) {
     LogError("qel: settings not saved to '" + s.path + "': " + e.what());
     return E_FAIL;
