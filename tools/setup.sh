@@ -3,7 +3,8 @@
 # Runs apt-get only when something is missing, so it is cheap to call every time.
 set -euo pipefail
 packages=(cmake ninja-build g++ pkg-config googletest libgtest-dev libgmock-dev libbenchmark-dev
-          nlohmann-json3-dev libpng-dev)
+          nlohmann-json3-dev libpng-dev libfreetype-dev fonts-dejavu-core libassimp-dev
+          libegl-dev libegl-mesa0 libgl1-mesa-dri)
 missing=()
 for p in "${packages[@]}"; do
   dpkg-query -W -f='${Status}' "$p" 2>/dev/null | grep -q 'install ok installed' || missing+=("$p")

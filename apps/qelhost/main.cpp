@@ -9,6 +9,7 @@
 
 #include "QelDictionary.h"
 #include "QelHostOptions.h"
+#include "QelHostPictures.h"
 #include "QelModelLoader.h"
 #include "QelModelPrinter.h"
 #include "QelModuleLoader.h"
@@ -103,6 +104,10 @@ void* LoadPlugin(const QelHostOptions& options) {
 int main(int argc, char** argv) {
   QelHostOptions options;
   std::string error;
+  if (int code = 0; QelHostPictures::Run(std::vector<std::string>(argv + 1, argv + argc), options.modulePath,
+                                         kQelSampleProductText, kQelSampleProductName, code)) {
+    return code;
+  }
   if (!QelHostOptions::Parse(std::vector<std::string>(argv + 1, argv + argc), options, error)) {
     std::fprintf(stderr, "qelhost: %s\n\n%s", error.c_str(), QelHostOptions::Usage());
     return 2;

@@ -1,0 +1,263 @@
+#include "QelRasterizer.h"
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+#include <cstdint>
+#include <numbers>
+
+#include "QelMathVectorf.h"
+#include "QelTextRenderer.h"
+
+namespace {
+// Geometry closer to the eye than this (model units) is cut: it would project to infinity.
+constexpr double kNear = 1e-2;
+
+uint8_t Byte(float v) { return static_cast<uint8_t>(std::clamp(v, 0.0f, 1.0f) * 255.0f + 0.5f); }
+
+// The eye's frame and the projection to pixels, fixed for one picture.
+struct Frame {
+  QelMathPoint eye;
+  QelMathVector right, up, forward;
+  double focal = 1.0;
+  double cx = 0.0, cy = 0.0;
+
+  Frame(const QelRenderView& v, int width, int height) : eye(v.eye) {
+    forward = QelMathDirection(v.sight);
+    if (forward.SquareNorm() == 0.0) forward = {0, 0, -1};
+    right = forward.Cross(v.up);
+    if (right.SquareNorm() < 1e-24) right = forward.Cross(std::abs(forward.z) < 0.9 ? QelMathVector{0, 0, 1} : QelMathVector{0, 1, 0});
+    right = QelMathDirection(right);
+    up = right.Cross(forward);
+    const double half = std::clamp(static_cast<double>(v.fieldOfView), 1.0, 170.0) * std::numbers::pi / 360.0;
+    focal = (height * 0.5) / std::tan(half);
+    cx = width * 0.5;
+    cy = height * 0.5;
+  }
+  // Eye coordinates: x right, y up, z depth in front of the eye.
+  QelMathVector ToEye(const QelMathPoint& p) const {
+    const QelMathVector d = p - eye;
+    return {d.Dot(right), d.Dot(up), d.Dot(forward)};
+  }
+};
+
+// A vertex on its way to the screen: eye coordinates, then pixels and 1/depth.
+struct Vtx {
+  QelMathVector e;
+  float sx = 0, sy = 0, iz = 0;
+};
+
+void Project(const Frame& f, Vtx& v) {
+  v.iz = static_cast<float>(1.0 / v.e.z);
+  v.sx = static_cast<float>(f.cx + v.e.x * f.focal / v.e.z);
+  v.sy = static_cast<float>(f.cy - v.e.y * f.focal / v.e.z);
+}
+
+struct Target {
+  QelPixelImage& image;
+  std::vector<float> depth;  // 1/z of the nearest surface so far; 0 is the far end
+  int width, height;
+};
+
+void FillTriangle(Target& t, const Vtx& a, const Vtx& b, const Vtx& c, const uint8_t rgb[3]) {
+  const float area = (b.sx - a.sx) * (c.sy - a.sy) - (b.sy - a.sy) * (c.sx - a.sx);
+  if (area == 0.0f || !std::isfinite(area)) return;
+  const int x0 = std::max(0, static_cast<int>(std::floor(std::min({a.sx, b.sx, c.sx}))));
+  const int x1 = std::min(t.width - 1, static_cast<int>(std::ceil(std::max({a.sx, b.sx, c.sx}))));
+  const int y0 = std::max(0, static_cast<int>(std::floor(std::min({a.sy, b.sy, c.sy}))));
+  const int y1 = std::min(t.height - 1, static_cast<int>(std::ceil(std::max({a.sy, b.sy, c.sy}))));
+  if (x0 > x1 || y0 > y1) return;
+  const float inv = 1.0f / area;
+  // Edge functions stepped across the box; each is positive inside for either winding
+  // once multiplied by the sign of the area.
+  const float e0x = (b.sy - c.sy) * inv, e0y = (c.sx - b.sx) * inv;
+  const float e1x = (c.sy - a.sy) * inv, e1y = (a.sx - c.sx) * inv;
+  const float e2x = (a.sy - b.sy) * inv, e2y = (b.sx - a.sx) * inv;
+  const float px = x0 + 0.5f, py = y0 + 0.5f;
+  float w0r = ((b.sx - px) * (c.sy - py) - (b.sy - py) * (c.sx - px)) * inv;
+  float w1r = ((c.sx - px) * (a.sy - py) - (c.sy - py) * (a.sx - px)) * inv;
+  float w2r = ((a.sx - px) * (b.sy - py) - (a.sy - py) * (b.sx - px)) * inv;
+  uint8_t* pixels = t.image.GetPixels();
+  for (int y = y0; y <= y1; ++y) {
+    float w0 = w0r, w1 = w1r, w2 = w2r;
+    float* zrow = t.depth.data() + static_cast<size_t>(y) * t.width;
+    uint8_t* prow = pixels + static_cast<size_t>(y) * t.width * 3;
+    for (int x = x0; x <= x1; ++x) {
+      if (w0 >= 0.0f && w1 >= 0.0f && w2 >= 0.0f) {
+        const float iz = w0 * a.iz + w1 * b.iz + w2 * c.iz;
+        if (iz > zrow[x]) {
+          zrow[x] = iz;
+          uint8_t* p = prow + x * 3;
+          p[0] = rgb[0];
+          p[1] = rgb[1];
+          p[2] = rgb[2];
+        }
+      }
+      w0 += e0x;
+      w1 += e1x;
+      w2 += e2x;
+    }
+    w0r += e0y;
+    w1r += e1y;
+    w2r += e2y;
+  }
+}
+
+// Sutherland-Hodgman against one half space (keeps d <= 0).
+template <class Dist>
+void ClipPolygon(std::vector<QelMathPoint>& poly, Dist dist) {
+  std::vector<QelMathPoint> out;
+  out.reserve(poly.size() + 2);
+  for (size_t i = 0; i < poly.size(); ++i) {
+    const QelMathPoint& p = poly[i];
+    const QelMathPoint& q = poly[(i + 1) % poly.size()];
+    const double dp = dist(p), dq = dist(q);
+    if (dp <= 0.0) out.push_back(p);
+    if ((dp <= 0.0) != (dq <= 0.0)) out.push_back(p + (q - p) * (dp / (dp - dq)));
+  }
+  poly.swap(out);
+}
+
+void DrawMesh(Target& t, const Frame& f, const QelRenderView& view, const QelRenderMesh& mesh) {
+  if (!mesh.shape) return;
+  const QelMeshShape& shape = *mesh.shape;
+  const bool clipped = !view.clipping.empty();
+  std::vector<QelMathPoint> world(shape.vertices.size());
+  std::vector<Vtx> vtx(shape.vertices.size());
+  std::vector<uint8_t> cut(shape.vertices.size(), 0);  // bit 0: behind the near plane; bit 1: clipped
+  for (size_t i = 0; i < world.size(); ++i) {
+    const auto& v = shape.vertices[i];
+    world[i] = mesh.toWorld.Apply({v[0], v[1], v[2]});
+    vtx[i].e = f.ToEye(world[i]);
+    if (vtx[i].e.z < kNear)
+      cut[i] |= 1;
+    else
+      Project(f, vtx[i]);
+    for (const QelMathPlane& plane : view.clipping)
+      if (plane.DistanceTo(world[i]) > 0.0) cut[i] |= 2;
+  }
+  const bool mirrored = mesh.toWorld.Determinant() < 0.0;
+  for (const auto& tri : shape.triangles) {
+    if (tri[0] >= world.size() || tri[1] >= world.size() || tri[2] >= world.size()) continue;
+    const QelMathPoint &a = world[tri[0]], &b = world[tri[1]], &c = world[tri[2]];
+    QelMathVector n = (b - a).Cross(c - a);
+    if (mirrored) n = -n;
+    const double nn = n.Norm();
+    if (nn == 0.0) continue;
+    const bool front = n.Dot(f.eye - a) > 0.0;
+    // Closed shapes show no back face unless a clipping plane opens them.
+    if (!front && !clipped) continue;
+    float light = 1.0f;
+    if (view.shading) light = static_cast<float>(0.25 + 0.75 * std::abs(n.Dot(f.forward)) / nn);
+    if (!front) light *= 0.45f;
+    const uint8_t rgb[3] = {Byte(mesh.color.r * light), Byte(mesh.color.g * light), Byte(mesh.color.b * light)};
+    const uint8_t any = cut[tri[0]] | cut[tri[1]] | cut[tri[2]];
+    if (!any) {
+      FillTriangle(t, vtx[tri[0]], vtx[tri[1]], vtx[tri[2]], rgb);
+      continue;
+    }
+    if ((cut[tri[0]] & cut[tri[1]] & cut[tri[2]] & 1)) continue;
+    std::vector<QelMathPoint> poly{a, b, c};
+    for (const QelMathPlane& plane : view.clipping) {
+      ClipPolygon(poly, [&](const QelMathPoint& p) { return plane.DistanceTo(p); });
+      if (poly.size() < 3) break;
+    }
+    if (poly.size() < 3) continue;
+    ClipPolygon(poly, [&](const QelMathPoint& p) { return kNear - f.ToEye(p).z; });
+    if (poly.size() < 3) continue;
+    std::vector<Vtx> pv(poly.size());
+    for (size_t i = 0; i < poly.size(); ++i) {
+      pv[i].e = f.ToEye(poly[i]);
+      Project(f, pv[i]);
+    }
+    for (size_t i = 1; i + 1 < pv.size(); ++i) FillTriangle(t, pv[0], pv[i], pv[i + 1], rgb);
+  }
+}
+
+void Blend(QelPixelImage& image, int x, int y, const uint8_t rgb[3]) { image.SetPixel(x, y, rgb[0], rgb[1], rgb[2]); }
+
+void Line(QelPixelImage& image, int x0, int y0, int x1, int y1, const uint8_t rgb[3]) {
+  const int dx = std::abs(x1 - x0), sx = x0 < x1 ? 1 : -1;
+  const int dy = -std::abs(y1 - y0), sy = y0 < y1 ? 1 : -1;
+  // Lines far off the picture are not walked pixel by pixel.
+  if (std::max(dx, -dy) > 4 * (image.GetWidth() + image.GetHeight())) return;
+  int err = dx + dy;
+  for (;;) {
+    Blend(image, x0, y0, rgb);
+    Blend(image, x0 + 1, y0, rgb);
+    if (x0 == x1 && y0 == y1) break;
+    const int e2 = 2 * err;
+    if (e2 >= dy) {
+      err += dy;
+      x0 += sx;
+    }
+    if (e2 <= dx) {
+      err += dx;
+      y0 += sy;
+    }
+  }
+}
+
+bool Clipped(const QelRenderView& view, const QelMathPoint& p) {
+  for (const QelMathPlane& plane : view.clipping)
+    if (plane.DistanceTo(p) > 1e-9) return true;
+  return false;
+}
+
+void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& view, const QelRenderAnnotation& a) {
+  if (Clipped(view, a.anchor)) return;
+  Vtx anchor;
+  anchor.e = f.ToEye(a.anchor);
+  if (anchor.e.z < kNear) return;
+  Project(f, anchor);
+  const uint8_t rgb[3] = {Byte(a.color.r), Byte(a.color.g), Byte(a.color.b)};
+  for (size_t i = 0; i + 1 < a.segments.size(); i += 2) {
+    std::vector<QelMathPoint> seg{a.segments[i], a.segments[i + 1]};
+    if (Clipped(view, seg[0]) || Clipped(view, seg[1])) continue;
+    Vtx p, q;
+    p.e = f.ToEye(seg[0]);
+    q.e = f.ToEye(seg[1]);
+    if (p.e.z < kNear || q.e.z < kNear) continue;
+    Project(f, p);
+    Project(f, q);
+    Line(image, static_cast<int>(p.sx), static_cast<int>(p.sy), static_cast<int>(q.sx), static_cast<int>(q.sy), rgb);
+  }
+  const int ax = static_cast<int>(std::lround(anchor.sx)), ay = static_cast<int>(std::lround(anchor.sy));
+  if (ax < -1000 || ay < -1000 || ax > image.GetWidth() + 1000 || ay > image.GetHeight() + 1000) return;
+  for (int y = -2; y <= 2; ++y)
+    for (int x = -2; x <= 2; ++x) Blend(image, ax + x, ay + y, rgb);
+  // The frame sits up and right of its anchor, sized to the text it holds.
+  const int pad = 3;
+  const int textWidth = view.text ? view.text->Measure(a.text) : 0;
+  const int textHeight = view.text ? view.text->LineHeight() : 10;
+  const int w = std::max(textWidth, 24) + 2 * pad, h = textHeight + 2 * pad;
+  const int left = ax + 6, top = ay - 6 - h;
+  const uint8_t paper[3] = {250, 250, 245};
+  for (int y = top; y < top + h; ++y)
+    for (int x = left; x < left + w; ++x) {
+      const bool border = y < top + 2 || y >= top + h - 2 || x < left + 2 || x >= left + w - 2;
+      Blend(image, x, y, border ? rgb : paper);
+    }
+  if (view.text && !a.text.empty()) {
+    const QelRenderColor ink{a.color.r * 0.45f, a.color.g * 0.45f, a.color.b * 0.45f};
+    view.text->Draw(image, left + pad, top + pad, a.text, ink);
+  }
+}
+}  // namespace
+
+void QelRasterizer::Render(const QelRenderScene& scene, const QelRenderView& view, QelPixelImage& image) {
+  const int width = image.GetWidth(), height = image.GetHeight();
+  if (width == 0 || height == 0) return;
+  const uint8_t bg[3] = {Byte(view.background.r), Byte(view.background.g), Byte(view.background.b)};
+  uint8_t* p = image.GetPixels();
+  for (size_t i = 0, n = static_cast<size_t>(width) * height; i < n; ++i, p += 3) {
+    p[0] = bg[0];
+    p[1] = bg[1];
+    p[2] = bg[2];
+  }
+  Target target{image, std::vector<float>(static_cast<size_t>(width) * height, 0.0f), width, height};
+  const Frame frame(view, width, height);
+  for (const QelRenderMesh& mesh : scene.meshes) DrawMesh(target, frame, view, mesh);
+  if (view.annotations)
+    for (const QelRenderAnnotation& a : scene.annotations) DrawAnnotation(image, frame, view, a);
+}
