@@ -213,7 +213,16 @@ void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
   const uint8_t rgb[3] = {Byte(a.color.r), Byte(a.color.g), Byte(a.color.b)};
   for (size_t i = 0; i + 1 < a.segments.size(); i += 2) {
     std::vector<QelMathPoint> seg{a.segments[i], a.segments[i + 1]};
-    if (Clipped(view, seg[0]) || Clipped(view, seg[1])) continue;
+    // A leader crossing a clipping plane is drawn up to the plane.
+    bool gone = false;
+    for (const QelMathPlane& plane : view.clipping) {
+      const double d0 = plane.DistanceTo(seg[0]), d1 = plane.DistanceTo(seg[1]);
+      if (d0 > 1e-9 && d1 > 1e-9) gone = true;
+      if (gone) break;
+      if (d0 > 1e-9) seg[0] = seg[0] + (seg[1] - seg[0]) * (d0 / (d0 - d1));
+      if (d1 > 1e-9) seg[1] = seg[1] + (seg[0] - seg[1]) * (d1 / (d1 - d0));
+    }
+    if (gone) continue;
     Vtx p, q;
     p.e = f.ToEye(seg[0]);
     q.e = f.ToEye(seg[1]);
