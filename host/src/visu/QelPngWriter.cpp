@@ -43,7 +43,8 @@ bool EncodeTo(const QelPixelImage& image, Sink& sink, char* message, size_t size
   png_set_write_fn(png, &sink, WriteData, Flush);
   // Fast settings: a thumbnail is encoded on every preview and read rarely.
   png_set_compression_level(png, 1);
-  png_set_filter(png, PNG_FILTER_TYPE_BASE, PNG_FILTER_SUB);
+  png_set_compression_strategy(png, 3);  // Z_RLE: rows of flat colour and background dominate a thumbnail
+  png_set_filter(png, PNG_FILTER_TYPE_BASE, PNG_FILTER_UP);
   png_set_IHDR(png, info, image.GetWidth(), image.GetHeight(), 8, PNG_COLOR_TYPE_RGB, PNG_INTERLACE_NONE,
                PNG_COMPRESSION_TYPE_DEFAULT, PNG_FILTER_TYPE_DEFAULT);
   png_write_info(png, info);

@@ -118,46 +118,90 @@ void ClipPolygon(std::vector<QelMathPoint>& poly, Dist dist) {
   poly.swap(out);
 }
 
+// A vertex of a mesh ready for the screen: pixels and 1/depth; `cut` says why it is not
+// (bit 0: behind the near plane, bit 1: clipped away).
+struct ScreenVtx {
+  float sx = 0, sy = 0, iz = 0;
+};
+
 void DrawMesh(Target& t, const Frame& f, const QelRenderView& view, const QelRenderMesh& mesh) {
   if (!mesh.shape) return;
   const QelMeshShape& shape = *mesh.shape;
   const bool clipped = !view.clipping.empty();
-  std::vector<QelMathPoint> world(shape.vertices.size());
-  std::vector<Vtx> vtx(shape.vertices.size());
-  std::vector<uint8_t> cut(shape.vertices.size(), 0);  // bit 0: behind the near plane; bit 1: clipped
-  for (size_t i = 0; i < world.size(); ++i) {
-    const auto& v = shape.vertices[i];
-    world[i] = mesh.toWorld.Apply({v[0], v[1], v[2]});
-    vtx[i].e = f.ToEye(world[i]);
-    if (vtx[i].e.z < kNear)
-      cut[i] |= 1;
-    else
-      Project(f, vtx[i]);
-    for (const QelMathPlane& plane : view.clipping)
-      if (plane.DistanceTo(world[i]) > 0.0) cut[i] |= 2;
+  const size_t count = shape.vertices.size();
+  // The eye's frame composed with the mesh's placement, once per mesh, in single precision
+  // for the per-vertex work.
+  const QelMathTransformation& w = mesh.toWorld;
+  const QelMathVector ax[3] = {w.GetXAxis(), w.GetYAxis(), w.GetZAxis()};
+  const QelMathVector rel = w.GetTranslation() - f.eye;
+  float m[3][4];
+  const QelMathVector rows[3] = {f.right, f.up, f.forward};
+  for (int r = 0; r < 3; ++r) {
+    for (int c = 0; c < 3; ++c) m[r][c] = static_cast<float>(rows[r].Dot(ax[c]));
+    m[r][3] = static_cast<float>(rows[r].Dot(rel));
   }
-  const bool mirrored = mesh.toWorld.Determinant() < 0.0;
+  const float focal = static_cast<float>(f.focal), cx = static_cast<float>(f.cx), cy = static_cast<float>(f.cy);
+  std::vector<std::array<float, 3>> world(count);
+  std::vector<ScreenVtx> vtx(count);
+  std::vector<uint8_t> cut(count, 0);
+  for (size_t i = 0; i < count; ++i) {
+    const auto& v = shape.vertices[i];
+    const QelMathPoint p = w.Apply({v[0], v[1], v[2]});
+    world[i] = {static_cast<float>(p.x), static_cast<float>(p.y), static_cast<float>(p.z)};
+    const float ex = m[0][0] * v[0] + m[0][1] * v[1] + m[0][2] * v[2] + m[0][3];
+    const float ey = m[1][0] * v[0] + m[1][1] * v[1] + m[1][2] * v[2] + m[1][3];
+    const float ez = m[2][0] * v[0] + m[2][1] * v[1] + m[2][2] * v[2] + m[2][3];
+    if (ez < kNear) {
+      cut[i] |= 1;
+    } else {
+      const float iz = 1.0f / ez;
+      vtx[i] = {cx + ex * focal * iz, cy - ey * focal * iz, iz};
+    }
+    for (const QelMathPlane& plane : view.clipping)
+      if (plane.DistanceTo(p) > 0.0) cut[i] |= 2;
+  }
+  const bool mirrored = w.Determinant() < 0.0;
+  const float fx = static_cast<float>(f.forward.x), fy = static_cast<float>(f.forward.y),
+              fz = static_cast<float>(f.forward.z);
   for (const auto& tri : shape.triangles) {
-    if (tri[0] >= world.size() || tri[1] >= world.size() || tri[2] >= world.size()) continue;
-    const QelMathPoint &a = world[tri[0]], &b = world[tri[1]], &c = world[tri[2]];
-    QelMathVector n = (b - a).Cross(c - a);
-    if (mirrored) n = -n;
-    const double nn = n.Norm();
-    if (nn == 0.0) continue;
-    const bool front = n.Dot(f.eye - a) > 0.0;
-    // Closed shapes show no back face unless a clipping plane opens them.
-    if (!front && !clipped) continue;
+    if (tri[0] >= count || tri[1] >= count || tri[2] >= count) continue;
+    const uint8_t any = cut[tri[0]] | cut[tri[1]] | cut[tri[2]];
+    const ScreenVtx &sa = vtx[tri[0]], &sb = vtx[tri[1]], &sc = vtx[tri[2]];
+    bool front = true;
+    if (!any) {
+      // Seen from the eye a front face turns counter-clockwise, clockwise on a y-down screen.
+      const float area = (sb.sx - sa.sx) * (sc.sy - sa.sy) - (sb.sy - sa.sy) * (sc.sx - sa.sx);
+      if (area == 0.0f) continue;
+      front = mirrored ? area > 0.0f : area < 0.0f;
+      // Closed shapes show no back face unless a clipping plane opens them.
+      if (!front && !clipped) continue;
+    }
+    const auto &a = world[tri[0]], &b = world[tri[1]], &c = world[tri[2]];
+    const float ux = b[0] - a[0], uy = b[1] - a[1], uz = b[2] - a[2];
+    const float vx = c[0] - a[0], vy = c[1] - a[1], vz = c[2] - a[2];
+    float nx = uy * vz - uz * vy, ny = uz * vx - ux * vz, nz = ux * vy - uy * vx;
+    const float nn = std::sqrt(nx * nx + ny * ny + nz * nz);
+    if (nn == 0.0f) continue;
+    if (any) {
+      if (mirrored) nx = -nx, ny = -ny, nz = -nz;
+      front = nx * static_cast<float>(f.eye.x - a[0]) + ny * static_cast<float>(f.eye.y - a[1]) +
+                  nz * static_cast<float>(f.eye.z - a[2]) > 0.0f;
+      if (!front && !clipped) continue;
+    }
     float light = 1.0f;
-    if (view.shading) light = static_cast<float>(0.25 + 0.75 * std::abs(n.Dot(f.forward)) / nn);
+    if (view.shading) light = 0.25f + 0.75f * std::abs(nx * fx + ny * fy + nz * fz) / nn;
     if (!front) light *= 0.45f;
     const uint8_t rgb[3] = {Byte(mesh.color.r * light), Byte(mesh.color.g * light), Byte(mesh.color.b * light)};
-    const uint8_t any = cut[tri[0]] | cut[tri[1]] | cut[tri[2]];
     if (!any) {
-      FillTriangle(t, vtx[tri[0]], vtx[tri[1]], vtx[tri[2]], rgb);
+      Vtx va, vb, vc;
+      va.sx = sa.sx, va.sy = sa.sy, va.iz = sa.iz;
+      vb.sx = sb.sx, vb.sy = sb.sy, vb.iz = sb.iz;
+      vc.sx = sc.sx, vc.sy = sc.sy, vc.iz = sc.iz;
+      FillTriangle(t, va, vb, vc, rgb);
       continue;
     }
-    if ((cut[tri[0]] & cut[tri[1]] & cut[tri[2]] & 1)) continue;
-    std::vector<QelMathPoint> poly{a, b, c};
+    if (cut[tri[0]] & cut[tri[1]] & cut[tri[2]] & 1) continue;
+    std::vector<QelMathPoint> poly{{a[0], a[1], a[2]}, {b[0], b[1], b[2]}, {c[0], c[1], c[2]}};
     for (const QelMathPlane& plane : view.clipping) {
       ClipPolygon(poly, [&](const QelMathPoint& p) { return plane.DistanceTo(p); });
       if (poly.size() < 3) break;
