@@ -24,6 +24,9 @@ class QelRovBrowserViewToolboxProbe {
     return QelRovBrowserViewToolbox::ApplyCaptureViewpoint(p, v, r);
   }
   static HRESULT Modes(Qel3DViewer* v) { return QelRovBrowserViewToolbox::InitializeViewModesFomCurrentViewer(v); }
+  static QelVar<QelPathElement> Path(QelBaseUnknown_var& o, QelPathElement* r) {
+    return QelVar<QelPathElement>::Adopt(QelRovBrowserViewToolbox::CreateObjectPath(o, r));
+  }
 };
 using Probe = QelRovBrowserViewToolboxProbe;
 
@@ -306,4 +309,40 @@ TEST_F(ToolboxTest, HiddenAnnotationLeavesNoPixelOfItsColour) {
   EXPECT_GT(count(), 0);
   for (auto& a : annotations_) QelModelBuilder::SetShown(a, false);
   EXPECT_EQ(count(), 0);
+}
+
+TEST_F(ToolboxTest, ObjectPathsHangBelowTheRoot) {
+  QelBaseUnknown_var part = b_.AddProduct(b_.Root(), {.alias = "Part"});
+  QelBaseUnknown_var sub = b_.AddProduct(part, {.alias = "Sub"});
+  set_ = b_.AddSet(sub, {.alias = "S", .light = true});
+  QelBaseUnknown_var view = View("V", {});
+  auto root = RootPath();
+  // A light item becomes the leaf of a copy of the root path.
+  QelVar<QelPathElement> path = Probe::Path(view, root.get());
+  ASSERT_TRUE(path);
+  ASSERT_EQ(path->GetSize(), 2);
+  EXPECT_TRUE(path->GetLeaf()->IsEqual(view.get()));
+  EXPECT_EQ(root->GetSize(), 1) << "the root path itself is left as it was";
+  // A product builds the chain of products down from the root.
+  path = Probe::Path(sub, root.get());
+  ASSERT_TRUE(path);
+  ASSERT_EQ(path->GetSize(), 3);
+  EXPECT_TRUE((*path)[1]->IsEqual(part.get()));
+  QelAssertionCapture capture;
+  EXPECT_FALSE(Probe::Path(view, nullptr));
+  EXPECT_FALSE(Probe::Path(set_, root.get())) << "a set builds no path";
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer, kQelAssertNullHandler), 1);
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer), 2);
+}
+
+TEST_F(ToolboxTest, SceneShowsShownPartsPlacedInTheRoot) {
+  auto box = std::make_shared<const QelMeshShape>(QelMeshShape::Box({0, 0, 0}, {1, 1, 1}));
+  QelBaseUnknown_var part = b_.AddProduct(
+      b_.Root(), {.alias = "Part", .placement = QelMathTransformation::Translation({10, 0, 0}), .shape = box});
+  b_.AddProduct(part, {.alias = "Hidden", .shown = false, .shape = box});
+  auto scene = QelMakeVar<QelModelScene>(b_.Root().get());
+  QelRenderScene collected;
+  scene->CollectScene(collected, nullptr);
+  ASSERT_EQ(collected.meshes.size(), 1u);
+  EXPECT_EQ(collected.meshes[0].toWorld.Apply({0, 0, 0}), (QelMathPoint{10, 0, 0}));
 }
