@@ -87,32 +87,6 @@ bool WriteThumbnail(QelBaseUnknown* root, QelBaseUnknown* item, Qel3DViewer* vie
   return true;
 }
 
-bool WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file) {
-  Qel3DViewpoint* viewpoint = viewer->GetMain3DViewpoint();
-  viewpoint->SetOrientation(QelMathDirectionf(QelMathVector{-1, 1.5, -1}), QelMathDirectionf(QelMathVector{0, 0, 1}));
-  auto path = QelMakeVar<QelPathElement>();
-  path->AddChildElement(root);
-  viewer->PrepareViewpoint();
-  QelRovActivateAndDisplayToolbox::ReframeViewpointOnDisplayArea(path.get(), viewer, viewpoint);
-  QelSupport* support = viewer->GetSupport();
-  auto image = QelMakeVar<QelPixelImage>(support->GetWidth(), support->GetHeight());
-  QelVar<QelOffscreenSupport> offscreen = createSupport(support, image.get());
-  if (!offscreen) {
-    std::fprintf(stderr, "qelhost: %s: the viewer has no surface to draw\n", file.c_str());
-    return false;
-  }
-  offscreen->SetBackgroundColor(0.5f, 0.5f, 0.5f);
-  offscreen->SetTextSprites(1);
-  offscreen->Draw();
-  std::string error;
-  if (!QelPngWriter::Write(*image, file, error)) {
-    std::fprintf(stderr, "qelhost: %s\n", error.c_str());
-    return false;
-  }
-  std::printf("picture -> %s (%d x %d)\n", file.c_str(), image->GetWidth(), image->GetHeight());
-  return true;
-}
-
 int Produce(const std::vector<Request>& thumbnails, const std::vector<std::string>& pictures,
             const std::string& modelPath, const std::string& modulePath, const std::string& sampleText,
             const std::string& sampleName) {
@@ -133,47 +107,15 @@ int Produce(const std::vector<Request>& thumbnails, const std::vector<std::strin
   frame->GetLayout()->AddWindow(window.get());
   frame->GetLayout()->SetCurrentWindow(window.get());
   int failures = 0;
-  for (const std::string& file : pictures) failures += WritePicture(root.get(), viewer.get(), file) ? 0 : 1;
+  for (const std::string& file : pictures) failures += QelHostPictures::WritePicture(root.get(), viewer.get(), file);
   if (!thumbnails.empty()) {
     void* module = QelModuleLoader::Load(modulePath, error);
-    auto preview = module ? reinterpret_cast<PreviewFn>(dlsym(module, kPreviewSymbol)) : nullptr;
-    auto describe = module ? reinterpret_cast<DescriptionFn>(dlsym(module, kDescriptionSymbol)) : nullptr;
-    if (!preview || !describe) {
-      std::fprintf(stderr, "qelhost: %s\n", module ? "the plug-in exports no thumbnail toolbox" : error.c_str());
+    if (!module) {
+      std::fprintf(stderr, "qelhost: %s\n", error.c_str());
       ++failures;
     } else {
-      // The thumbnail viewer is a second viewer, as the views browser uses for previews.
-      auto previewViewer = QelMakeVar<Qel3DViewer>(576, 432);
-      previewViewer->SetSceneSource(viewer->GetSceneSource());
-      for (const Request& request : thumbnails) {
-        std::vector<std::pair<QelBaseUnknown_var, std::string>> jobs;
-        if (request.name == "*") {
-          std::filesystem::create_directories(request.output);
-          QelListValQelBaseUnknown_var items;
-          QelRovFacetServices::ListCapturesAndViewsOfVisibleSets(root.get(), items);
-          for (int i = 1; i <= items.Size(); ++i)
-            jobs.emplace_back(items[i], (std::filesystem::path(request.output) /
-                                         FileNameFor(QelModelObject::From(items[i].get())->Alias())).string());
-        } else {
-          QelListValQelBaseUnknown_var found = QelModelPrinter::FindByAlias(root.get(), request.name);
-          QelBaseUnknown_var item;
-          for (int i = 1; i <= found.Size() && !item; ++i)
-            if (QelVar<QelITPSView>(found[i].get()) || QelVar<QelILumCapture>(found[i].get())) item = found[i];
-          if (!item) {
-            std::fprintf(stderr, "qelhost: --thumbnail '%s': the model has no view or capture of that name\n",
-                         request.name.c_str());
-            ++failures;
-            continue;
-          }
-          jobs.emplace_back(item, request.output);
-        }
-        for (size_t i = 0; i < jobs.size(); ++i) {
-          if (jobs.size() > 1) std::printf("[%zu/%zu] ", i + 1, jobs.size());
-          failures += WriteThumbnail(root.get(), jobs[i].first.get(), previewViewer.get(), jobs[i].second, preview,
-                                     describe) ? 0 : 1;
-          std::fflush(stdout);
-        }
-      }
+      for (const Request& request : thumbnails)
+        failures += QelHostPictures::WriteThumbnails(module, root.get(), request.name, request.output);
     }
   }
   window->SetViewer(nullptr);
@@ -182,6 +124,79 @@ int Produce(const std::vector<Request>& thumbnails, const std::vector<std::strin
   return failures ? 1 : 0;
 }
 }  // namespace
+
+int QelHostPictures::WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file) {
+
+  Qel3DViewpoint* viewpoint = viewer->GetMain3DViewpoint();
+  viewpoint->SetOrientation(QelMathDirectionf(QelMathVector{-1, 1.5, -1}), QelMathDirectionf(QelMathVector{0, 0, 1}));
+  auto path = QelMakeVar<QelPathElement>();
+  path->AddChildElement(root);
+  viewer->PrepareViewpoint();
+  QelRovActivateAndDisplayToolbox::ReframeViewpointOnDisplayArea(path.get(), viewer, viewpoint);
+  QelSupport* support = viewer->GetSupport();
+  auto image = QelMakeVar<QelPixelImage>(support->GetWidth(), support->GetHeight());
+  QelVar<QelOffscreenSupport> offscreen = createSupport(support, image.get());
+  if (!offscreen) {
+    std::fprintf(stderr, "qelhost: %s: the viewer has no surface to draw\n", file.c_str());
+    return 1;
+  }
+  offscreen->SetBackgroundColor(0.5f, 0.5f, 0.5f);
+  offscreen->SetTextSprites(1);
+  offscreen->Draw();
+  std::string error;
+  if (!QelPngWriter::Write(*image, file, error)) {
+    std::fprintf(stderr, "qelhost: %s\n", error.c_str());
+    return 1;
+  }
+  std::printf("picture -> %s (%d x %d)\n", file.c_str(), image->GetWidth(), image->GetHeight());
+  return 0;
+}
+
+
+int QelHostPictures::WriteThumbnails(void* module, QelBaseUnknown* root, const std::string& name,
+                                     const std::string& output) {
+  auto preview = module ? reinterpret_cast<PreviewFn>(dlsym(module, kPreviewSymbol)) : nullptr;
+  auto describe = module ? reinterpret_cast<DescriptionFn>(dlsym(module, kDescriptionSymbol)) : nullptr;
+  if (!preview || !describe) {
+    std::fprintf(stderr, "qelhost: the plug-in exports no thumbnail toolbox\n");
+    return 1;
+  }
+  std::vector<std::pair<QelBaseUnknown_var, std::string>> jobs;
+  if (name == "*") {
+    std::error_code ec;
+    std::filesystem::create_directories(output, ec);
+    if (ec) {
+      std::fprintf(stderr, "qelhost: %s: %s\n", output.c_str(), ec.message().c_str());
+      return 1;
+    }
+    QelListValQelBaseUnknown_var items;
+    QelRovFacetServices::ListCapturesAndViewsOfVisibleSets(root, items);
+    for (int i = 1; i <= items.Size(); ++i)
+      jobs.emplace_back(items[i], (std::filesystem::path(output) /
+                                   FileNameFor(QelModelObject::From(items[i].get())->Alias())).string());
+  } else {
+    QelListValQelBaseUnknown_var found = QelModelPrinter::FindByAlias(root, name);
+    QelBaseUnknown_var item;
+    for (int i = 1; i <= found.Size() && !item; ++i)
+      if (QelVar<QelITPSView>(found[i].get()) || QelVar<QelILumCapture>(found[i].get())) item = found[i];
+    if (!item) {
+      std::fprintf(stderr, "qelhost: thumbnail '%s': the model has no view or capture of that name\n", name.c_str());
+      return 1;
+    }
+    jobs.emplace_back(item, output);
+  }
+  // Previews are drawn by a viewer of their own, as the views browser does, so the
+  // session's 3D viewer keeps its viewpoint; the current window's view modes are copied.
+  auto viewer = QelMakeVar<Qel3DViewer>(576, 432);
+  viewer->SetSceneSource(QelMakeVar<QelModelScene>(root).get());
+  int failures = 0;
+  for (size_t i = 0; i < jobs.size(); ++i) {
+    if (jobs.size() > 1) std::printf("[%zu/%zu] ", i + 1, jobs.size());
+    failures += WriteThumbnail(root, jobs[i].first.get(), viewer.get(), jobs[i].second, preview, describe) ? 0 : 1;
+    std::fflush(stdout);
+  }
+  return failures;
+}
 
 bool QelHostPictures::Run(const std::vector<std::string>& args, const std::string& modulePath,
                           const std::string& sampleText, const std::string& sampleName, int& exitCode) {
