@@ -80,3 +80,16 @@ TEST_F(QelMeshFileTest, PrimitivesAreCheckedWhereTheyAreWritten) {
             E_FAIL);
   EXPECT_NE(error.find("$.root.shape[0].cylinder.axis: the axis has no length"), std::string::npos) << error;
 }
+
+TEST(QelSampleShapesTest, EveryPartOfTheSampleHasAShape) {
+  QelBaseUnknown_var root;
+  std::string error;
+  ASSERT_EQ(QelModelLoader::LoadFile(std::string(QEL_SOURCE_DIR) + "/data/sample-product.json", root, error), S_OK)
+      << error;
+  auto* product = QelSysDynamicCast<QelPLMProductOccurrence>(root.get());
+  ASSERT_EQ(product->Children().size(), 3u);
+  for (const auto& part : product->Children()) {
+    ASSERT_TRUE(part->Shape()) << part->Alias();
+    EXPECT_GE(part->Shape()->TriangleCount(), 12u) << part->Alias();
+  }
+}
