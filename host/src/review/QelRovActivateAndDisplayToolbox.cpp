@@ -56,15 +56,27 @@ HRESULT QelRovActivateAndDisplayToolbox::ReframeViewpointOnDisplayArea(QelPathEl
   }
   QelMathPoint lo, hi;
   if (!SceneBounds(viewer, viewpoint, lo, hi)) lo = hi = viewpoint->GetTarget().ToDouble();
-  const QelMathPoint centre = (lo + hi) * 0.5;
-  const double radius = std::max((hi - lo).Norm() * 0.5, 1.0);
-  // The sphere around the box fits the narrower of the two angles of view.
-  const double halfV = viewpoint->GetFieldOfView() * std::numbers::pi / 360.0;
-  const double halfH = std::atan(std::tan(halfV) * viewpoint->GetAspectRatio());
-  const double distance = radius / std::sin(std::min(halfV, halfH)) * 1.05;
   const QelMathDirectionf s(sight);
-  viewpoint->SetOrigin(centre - s.ToDouble() * distance);
-  viewpoint->SetOrientation(s, QelMathDirectionf(up - s.ToDouble() * up.Dot(s.ToDouble())));
+  const QelMathVector f = s.ToDouble();
+  QelMathVector u = up - f * up.Dot(f);
+  if (u.SquareNorm() < 1e-18) u = std::abs(f.z) < 0.9 ? QelMathVector{0, 0, 1} : QelMathVector{0, 1, 0};
+  u = QelMathDirection(u - f * u.Dot(f));
+  const QelMathVector r = f.Cross(u);
+  // The box's extent across and along the sight, measured from its centre.
+  const QelMathPoint centre = (lo + hi) * 0.5;
+  double halfWidth = 0.0, halfHeight = 0.0, halfDepth = 0.0;
+  for (int i = 0; i < 8; ++i) {
+    const QelMathVector d = QelMathPoint{i & 1 ? hi.x : lo.x, i & 2 ? hi.y : lo.y, i & 4 ? hi.z : lo.z} - centre;
+    halfWidth = std::max(halfWidth, std::abs(d.Dot(r)));
+    halfHeight = std::max(halfHeight, std::abs(d.Dot(u)));
+    halfDepth = std::max(halfDepth, std::abs(d.Dot(f)));
+  }
+  const double margin = 1.12;  // room for annotation frames, which sit beside their anchors
+  const double tanV = std::tan(viewpoint->GetFieldOfView() * std::numbers::pi / 360.0);
+  const double tanH = tanV * viewpoint->GetAspectRatio();
+  const double fit = std::max({halfWidth / tanH, halfHeight / tanV, 1.0}) * margin;
+  viewpoint->SetOrigin(centre - f * (fit + halfDepth));
+  viewpoint->SetOrientation(s, QelMathDirectionf(u));
   viewpoint->SetTarget(QelMathPointf(centre));
   return S_OK;
 }
