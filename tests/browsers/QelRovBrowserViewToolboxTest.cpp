@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include <cmath>
+#include <memory>
 
 #include "Qel3DWindow.h"
 #include "QelApplicationFrame.h"
@@ -51,8 +52,15 @@ class ToolboxTest : public ::testing::Test {
   }
   void TearDown() override {
     window_->SetViewer(nullptr);
+    window_ = nullptr;
+    editor_ = nullptr;
+    current_ = nullptr;
+    set_ = nullptr;
+    annotations_.clear();
+    owned_.reset();
     QelApplicationFrame::DestroyFrame();
     QelDelayedDestruction::FlushIdle();
+    EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), liveBefore_) << "the scenario leaked or left a cycle";
   }
 
   // A set on the root with three annotations; view 1 holds the first two.
@@ -75,11 +83,14 @@ class ToolboxTest : public ::testing::Test {
     return path;
   }
 
+  // Counted before any member makes an object.
+  int64_t liveBefore_ = QelBaseUnknown::LiveObjectCount();
   QelApplicationFrame* frame_ = nullptr;
   QelVar<QelFrmEditor> editor_;
   QelVar<Qel3DWindow> window_;
   QelVar<Qel3DViewer> current_;
-  QelModelBuilder b_;
+  std::unique_ptr<QelModelBuilder> owned_ = std::make_unique<QelModelBuilder>();
+  QelModelBuilder& b_ = *owned_;
   QelBaseUnknown_var set_;
   std::vector<QelBaseUnknown_var> annotations_;
 };
