@@ -44,6 +44,8 @@ bool EncodeTo(const QelPixelImage& image, Sink& sink, char* message, size_t size
   // Fast settings: a thumbnail is encoded on every preview and read rarely.
   png_set_compression_level(png, 1);
   png_set_compression_strategy(png, 3);  // Z_RLE: rows of flat colour and background dominate a thumbnail
+  png_set_compression_mem_level(png, 9);
+  png_set_compression_buffer_size(png, 1 << 17);
   png_set_filter(png, PNG_FILTER_TYPE_BASE, PNG_FILTER_UP);
   png_set_IHDR(png, info, image.GetWidth(), image.GetHeight(), 8, PNG_COLOR_TYPE_RGB, PNG_INTERLACE_NONE,
                PNG_COMPRESSION_TYPE_DEFAULT, PNG_FILTER_TYPE_DEFAULT);
