@@ -11,6 +11,8 @@
 #include "QelDelayedDestruction.h"
 #include "QelFrm3DCamera.h"
 #include "QelFrmLayout.h"
+#include "QelIDriClippingFactory.h"
+#include "QelIDriFilterFactory.h"
 #include "QelModelBuilder.h"
 #include "QelModelScene.h"
 #include "QelReviewFramework.h"
@@ -356,4 +358,34 @@ TEST_F(ToolboxTest, SceneShowsShownPartsPlacedInTheRoot) {
   scene->CollectScene(collected, nullptr);
   ASSERT_EQ(collected.meshes.size(), 1u);
   EXPECT_EQ(collected.meshes[0].toWorld.Apply({0, 0, 0}), (QelMathPoint{10, 0, 0}));
+}
+
+TEST_F(ToolboxTest, FactoriesFilterOtherSetsAndClipInTheContext) {
+  QelBaseUnknown_var part = b_.AddProduct(
+      b_.Root(), {.alias = "Part", .placement = QelMathTransformation::Translation({0, 0, 100})});
+  set_ = b_.AddSet(part, {.alias = "Mine", .light = true});
+  QelBaseUnknown_var mine = b_.AddAnnotation(set_, {.alias = "M", .typeName = "Datum"});
+  QelBaseUnknown_var other = b_.AddSet(b_.Root(), {.alias = "Other", .light = true});
+  QelBaseUnknown_var theirs = b_.AddAnnotation(other, {.alias = "T", .typeName = "Datum"});
+  QelBaseUnknown_var view = View("V", {mine.get()}, Plane({0, 0, 1}, {0, 0, 5}));
+  QelBaseUnknown_var capture = b_.AddCapture(set_, {.alias = "C", .view = view.get()});
+  auto path = RootPath();
+  path->AddChildElement(part.get());
+  path->AddChildElement(capture.get());
+
+  QelVar<QelIDriFilterFactory> filters{capture.get()};
+  ASSERT_TRUE(filters);
+  QelVar<QelDbrFilter> filter;
+  ASSERT_EQ(filters->GetFilter(path.get(), false, filter), S_OK);
+  EXPECT_TRUE(filter->IsFilteredOut(theirs.get()));
+  EXPECT_FALSE(filter->IsFilteredOut(mine.get()));
+  EXPECT_EQ(filters->GetFilter(path.get(), true, filter), S_FALSE) << "the view holds all of its set";
+
+  QelVar<QelIDriClippingFactory> clippings{view.get()};
+  ASSERT_TRUE(clippings);
+  QelVar<QelDbrClipping> clipping;
+  ASSERT_EQ(clippings->GetClipping(path.get(), true, clipping), S_OK);
+  EXPECT_DOUBLE_EQ(clipping->GetPlane().DistanceTo({0, 0, 105}), 0.0) << "the part's plane, placed in the root";
+  EXPECT_EQ(QelVar<QelIDriClippingFactory>(capture.get())->GetClipping(path.get(), true, clipping), S_FALSE);
+  EXPECT_FALSE(clipping);
 }
