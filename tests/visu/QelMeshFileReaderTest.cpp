@@ -44,16 +44,19 @@ std::string BinaryStl(int triangles) {
 TEST_F(QelMeshFileTest, StlAndObjLoadWithTheirTriangles) {
   Write("part.stl", BinaryStl(5));
   Write("part.obj", "v 0 0 0\nv 1 0 0\nv 1 1 0\nv 0 1 0\nf 1 2 3 4\nf 1 3 4\n");
+  Write("part.ply",
+        "ply\nformat ascii 1.0\nelement vertex 3\nproperty float x\nproperty float y\nproperty float z\n"
+        "element face 1\nproperty list uchar int vertex_indices\nend_header\n0 0 0\n1 0 0\n0 1 0\n3 0 1 2\n");
   QelBaseUnknown_var root;
   std::string error;
-  ASSERT_EQ(QelModelLoader::LoadFile(Model(R"([{"mesh": {"file": "part.stl"}}, {"mesh": {"file": "part.obj"}},
+  ASSERT_EQ(QelModelLoader::LoadFile(Model(R"([{"mesh": {"file": "part.stl"}}, {"mesh": {"file": "part.obj"}}, {"mesh": {"file": "part.ply"}},
                                                {"box": {"min": [0,0,0], "max": [1,1,1]}}])"),
                                      root, error),
             S_OK)
       << error;
   auto* product = QelSysDynamicCast<QelPLMProductOccurrence>(root.get());
   ASSERT_TRUE(product && product->Shape());
-  EXPECT_EQ(product->Shape()->TriangleCount(), 5u + 3u + 12u);  // the quad is split in two
+  EXPECT_EQ(product->Shape()->TriangleCount(), 5u + 3u + 1u + 12u);  // the quad is split in two
 }
 
 TEST_F(QelMeshFileTest, BadMeshFilesAreRefusedNamingTheFile) {
