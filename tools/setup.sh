@@ -4,7 +4,8 @@
 # Runs apt-get only when something is missing, so it is cheap to call every time.
 set -euo pipefail
 packages=(cmake ninja-build g++ pkg-config googletest libgtest-dev libgmock-dev libbenchmark-dev
-          nlohmann-json3-dev libpng-dev libedit-dev)
+          nlohmann-json3-dev libpng-dev libedit-dev libfreetype-dev fonts-dejavu-core libassimp-dev
+          libegl-dev libegl-mesa0 libgl1-mesa-dri)
 for option in "$@"; do
   case "$option" in
     --fuzz) packages+=(clang libclang-rt-dev) ;;

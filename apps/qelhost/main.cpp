@@ -12,6 +12,7 @@
 
 #include "QelDictionary.h"
 #include "QelHostOptions.h"
+#include "QelHostPictures.h"
 #include "QelHostSession.h"
 #include "QelModelLoader.h"
 #include "QelModelPrinter.h"
@@ -136,6 +137,10 @@ int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
 int main(int argc, char** argv) {
   QelHostOptions options;
   std::string error;
+  if (int code = 0; QelHostPictures::Run(std::vector<std::string>(argv + 1, argv + argc), options.modulePath,
+                                         kQelSampleProductText, kQelSampleProductName, code)) {
+    return code;
+  }
   if (!QelHostOptions::Parse(std::vector<std::string>(argv + 1, argv + argc), options, error)) {
     std::fprintf(stderr, "qelhost: %s\n\n%s", error.c_str(), QelHostOptions::Usage());
     return 2;

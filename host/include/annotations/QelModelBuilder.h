@@ -19,6 +19,7 @@
 
 #include "QelMathPlane.h"
 #include "QelMathTransformation.h"
+#include "QelMeshShape.h"
 #include "QelVar.h"
 
 // Whether a set is one of the root product's own sets, and as what.
@@ -33,6 +34,8 @@ struct QelModelProductDesc {
   bool lightLoadMode = false;
   // From the product's coordinates to its father's; the root has no father and keeps the identity.
   QelMathTransformation placement{};
+  // The product's shape in its own coordinates (primitives or a mesh file), or none.
+  std::shared_ptr<const QelMeshShape> shape{};
 };
 
 struct QelModelRepInstanceDesc {
@@ -122,6 +125,9 @@ class QelModelBuilder {
 
   // Hands the root over and leaves the builder empty.
   QelBaseUnknown_var Finish();
+
+  // Gives a product of this model (the root too) its shape; false for anything else.
+  bool SetShape(const QelBaseUnknown_var& product, std::shared_ptr<const QelMeshShape> shape);
 
   // Shown/hidden state of any model object, outside the facet services.
   static bool SetShown(const QelBaseUnknown_var& object, bool shown);

@@ -16,6 +16,13 @@ class QelMathPlane {
   const QelMathVector& GetFirstDirection() const { return first_; }
   const QelMathVector& GetSecondDirection() const { return second_; }
 
+  // Signed distance of `p` from the plane, positive on the side the normal points to; 0 for
+  // a zero normal.
+  double DistanceTo(const QelMathPoint& p) const {
+    const double s = normal_.SquareNorm();
+    return s == 0.0 ? 0.0 : (p - origin_).Dot(normal_) / std::sqrt(s);
+  }
+
   // Orthogonal projection of `p` onto the plane; `p` itself for a zero normal.
   QelMathPoint Projection(const QelMathPoint& p) const {
     const double s = normal_.SquareNorm();

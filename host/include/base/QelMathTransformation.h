@@ -14,6 +14,18 @@ class QelMathTransformation {
       : x_(xAxis), y_(yAxis), z_(zAxis), t_(translation) {}
 
   static QelMathTransformation Translation(const QelMathVector& t) { return {{1, 0, 0}, {0, 1, 0}, {0, 0, 1}, t}; }
+  static QelMathTransformation Scale(double s) { return {{s, 0, 0}, {0, s, 0}, {0, 0, s}, {}}; }
+  // Right-handed rotation by `radians` about `axis` through the origin; the identity for a zero axis.
+  static QelMathTransformation Rotation(const QelMathVector& axis, double radians) {
+    const double n = axis.Norm();
+    if (n == 0.0) return {};
+    const QelMathVector u = axis * (1.0 / n);
+    const double c = std::cos(radians), s = std::sin(radians), k = 1.0 - c;
+    return {{c + u.x * u.x * k, u.y * u.x * k + u.z * s, u.z * u.x * k - u.y * s},
+            {u.x * u.y * k - u.z * s, c + u.y * u.y * k, u.z * u.y * k + u.x * s},
+            {u.x * u.z * k + u.y * s, u.y * u.z * k - u.x * s, c + u.z * u.z * k},
+            {}};
+  }
 
   const QelMathVector& GetXAxis() const { return x_; }
   const QelMathVector& GetYAxis() const { return y_; }

@@ -8,11 +8,13 @@
 // Observers are subscribed through QelCallbackManager: held weakly, they may be added or
 // removed during a notification, and one that goes away without RemoveObserver is
 // skipped, never called and never kept alive.
+#include <memory>
 #include <vector>
 
 #include "QelBaseUnknown_WR.h"
 #include "QelILumLightLoadModeObservable.h"
 #include "QelIPLMNavOccurrence.h"
+#include "QelMeshShape.h"
 #include "QelModelObject.h"
 
 class QelPLMRepInstance;
@@ -40,6 +42,10 @@ class QelPLMProductOccurrence : public QelModelObject,
   void AddChild(QelPLMProductOccurrence* child);
   void AddRepInstance(QelPLMRepInstance* rep);
   void SetPlacement(const QelMathTransformation& placement) { placement_ = placement; }
+  const QelMathTransformation& Placement() const { return placement_; }
+  // The product's own shape in its coordinates, shared with every picture; null: none.
+  void SetShape(std::shared_ptr<const QelMeshShape> shape) { shape_ = std::move(shape); }
+  const std::shared_ptr<const QelMeshShape>& Shape() const { return shape_; }
   QelPLMProductOccurrence* Father() const;
   const std::vector<QelVar<QelPLMProductOccurrence>>& Children() const { return children_; }
   const std::vector<QelVar<QelPLMRepInstance>>& RepInstances() const { return reps_; }
@@ -60,4 +66,5 @@ class QelPLMProductOccurrence : public QelModelObject,
   QelBaseUnknown_WR data_;
   bool lightLoadMode_ = false;
   QelMathTransformation placement_;
+  std::shared_ptr<const QelMeshShape> shape_;
 };

@@ -31,6 +31,7 @@ QelModelBuilder::QelModelBuilder(const QelModelProductDesc& root) : state_(std::
   state_->model = QelMakeVar<QelAnnotationModel>(state_->root.get());
   state_->root->SetModelData(state_->model.get(), true);
   state_->root->SetLightLoadMode(root.lightLoadMode);
+  state_->root->SetShape(root.shape);
 }
 
 QelModelBuilder::~QelModelBuilder() = default;
@@ -49,8 +50,17 @@ QelBaseUnknown_var QelModelBuilder::AddProduct(const QelBaseUnknown_var& parent,
   child->SetModelData(state_->model.get(), false);
   child->SetLightLoadMode(desc.lightLoadMode);
   child->SetPlacement(desc.placement);
+  child->SetShape(desc.shape);
   father->AddChild(child.get());
   return QelBaseUnknown_var(child.get());
+}
+
+bool QelModelBuilder::SetShape(const QelBaseUnknown_var& product, std::shared_ptr<const QelMeshShape> shape) {
+  if (!state_->model) return false;
+  auto* occurrence = state_->Mine<QelPLMProductOccurrence>(product.get());
+  if (!occurrence) return false;
+  occurrence->SetShape(std::move(shape));
+  return true;
 }
 
 QelBaseUnknown_var QelModelBuilder::AddRepInstance(const QelBaseUnknown_var& product, const QelModelRepInstanceDesc& desc) {

@@ -20,6 +20,7 @@
 
 #include "QelModelBuilder.h"
 #include "QelModelJsonReader.h"
+#include "QelModelShapes.h"
 #include "QelTPSTypeClassifier.h"
 
 namespace {
@@ -213,8 +214,10 @@ class Loader {
   }
 
   void Product(const Json& p, const Where& where, QelBaseUnknown* made) {
-    CheckKeys(p, where, {"id", "alias", "icon", "shown", "lightLoadMode", "placement", "reps", "children"});
+    CheckKeys(p, where, {"id", "alias", "icon", "shown", "lightLoadMode", "placement", "shape", "reps", "children"});
     Declare(p, where, made, Kind::Product);
+    if (auto it = p.find("shape"); it != p.end())
+      builder_.SetShape(QelBaseUnknown_var(made), QelModelShapes::Read(*it, where.Key("shape").Text(), made));
     if (auto it = p.find("reps"); it != p.end()) {
       Where repsAt = where.Key("reps");
       const Json& reps = Array(*it, repsAt);

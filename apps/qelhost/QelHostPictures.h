@@ -1,0 +1,21 @@
+#pragma once
+// QelHostPictures: qelhost's one-shot picture options. `--thumbnail NAME --output FILE`
+// (repeatable; NAME "*" writes every view and capture into the folder FILE) writes the
+// plug-in's thumbnail of a view or capture as PNG and prints its description;
+// `--picture FILE` writes the 3D viewer's picture of the whole model.
+#include <string>
+#include <vector>
+
+#include "Qel3DViewer.h"
+
+namespace QelHostPictures {
+// The session's picture commands, for a model `root` shown by `viewer`. `module` is the
+// loaded plug-in (its toolbox makes the thumbnails). Each prints what it wrote, or why
+// not on stderr, and answers the number of pictures that could not be written.
+int WriteThumbnails(void* module, QelBaseUnknown* root, const std::string& name, const std::string& output);
+int WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file);
+
+// True when `args` ask for pictures; then `exitCode` is what qelhost returns.
+bool Run(const std::vector<std::string>& args, const std::string& modulePath, const std::string& sampleText,
+         const std::string& sampleName, int& exitCode);
+}  // namespace QelHostPictures

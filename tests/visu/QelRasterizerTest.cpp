@@ -1,0 +1,156 @@
+// The renderer is checked by what a person sees: a few small numbered reference pictures
+// (tests/visu/golden/NNN-name.png) and a few properties. Regenerate the pictures after an
+// intended change with QEL_REGENERATE_GOLDEN=1 and look at them before committing.
+// Tolerance: a pixel differs when a channel is off by more than 8; at most 0.5% may differ.
+#include <gtest/gtest.h>
+#include <png.h>
+
+#include <cstdlib>
+#include <filesystem>
+
+#include "QelPngWriter.h"
+#include "QelRasterizer.h"
+#include "QelTextRenderer.h"
+
+namespace {
+const std::filesystem::path kGolden = std::filesystem::path(QEL_SOURCE_DIR) / "tests/visu/golden";
+
+QelVar<QelPixelImage> ReadPng(const std::filesystem::path& file) {
+  png_image image{};
+  image.version = PNG_IMAGE_VERSION;
+  if (!png_image_begin_read_from_file(&image, file.c_str())) return {};
+  image.format = PNG_FORMAT_RGB;
+  auto out = QelMakeVar<QelPixelImage>(static_cast<int>(image.width), static_cast<int>(image.height));
+  if (!png_image_finish_read(&image, nullptr, out->GetPixels(), 0, nullptr)) return {};
+  return out;
+}
+
+void ExpectLooksLike(const QelPixelImage& made, const char* name) {
+  const std::filesystem::path file = kGolden / name;
+  if (std::getenv("QEL_REGENERATE_GOLDEN")) {
+    std::string error;
+    ASSERT_TRUE(QelPngWriter::Write(made, file.string(), error)) << error;
+    return;
+  }
+  QelVar<QelPixelImage> golden = ReadPng(file);
+  ASSERT_TRUE(golden) << file << " is missing; run with QEL_REGENERATE_GOLDEN=1";
+  ASSERT_EQ(golden->GetWidth(), made.GetWidth());
+  ASSERT_EQ(golden->GetHeight(), made.GetHeight());
+  int differing = 0;
+  const int n = made.GetWidth() * made.GetHeight();
+  for (int i = 0; i < n; ++i)
+    for (int c = 0; c < 3; ++c)
+      if (std::abs(made.GetPixels()[i * 3 + c] - golden->GetPixels()[i * 3 + c]) > 8) {
+        ++differing;
+        break;
+      }
+  EXPECT_LE(differing, n / 200) << name << ": " << differing << " pixels differ";
+}
+
+std::shared_ptr<const QelMeshShape> Shape(QelMeshShape m) { return std::make_shared<const QelMeshShape>(std::move(m)); }
+
+std::shared_ptr<const QelMeshShape> Triangle(float z) {
+  QelMeshShape m;
+  m.vertices = {{-1, -1, z}, {1, -1, z}, {0, 1, z}};
+  m.triangles = {{0, 1, 2}};
+  return Shape(m);
+}
+
+QelRenderView LookDownZ(double distance) {
+  QelRenderView view;
+  view.eye = {0, 0, distance};
+  view.sight = {0, 0, -1};
+  view.up = {0, 1, 0};
+  return view;
+}
+
+bool HasColor(const QelPixelImage& image, uint8_t r, uint8_t g, uint8_t b) {
+  for (int i = 0, n = image.GetWidth() * image.GetHeight(); i < n; ++i) {
+    const uint8_t* p = image.GetPixels() + i * 3;
+    if (p[0] == r && p[1] == g && p[2] == b) return true;
+  }
+  return false;
+}
+}  // namespace
+
+TEST(QelRasterizerTest, EmptySceneIsBackgroundOnly) {
+  auto image = QelMakeVar<QelPixelImage>(32, 24);
+  QelRenderView view = LookDownZ(10);
+  view.background = {0.5f, 0.5f, 0.5f};
+  QelRasterizer::Render(QelRenderScene{}, view, *image);
+  for (int i = 0; i < 32 * 24 * 3; ++i) ASSERT_EQ(image->GetPixels()[i], 128);
+}
+
+TEST(QelRasterizerTest, NearerTriangleHidesFartherOneWhateverTheOrder) {
+  for (bool nearFirst : {true, false}) {
+    QelRenderScene scene;
+    QelRenderMesh nearMesh{Triangle(1), {}, {1, 0, 0}}, farMesh{Triangle(-1), {}, {0, 0, 1}};
+    scene.meshes = nearFirst ? std::vector{nearMesh, farMesh} : std::vector{farMesh, nearMesh};
+    QelRenderView view = LookDownZ(10);
+    view.shading = false;
+    auto image = QelMakeVar<QelPixelImage>(64, 64);
+    QelRasterizer::Render(scene, view, *image);
+    uint8_t r, g, b;
+    image->GetPixel(32, 34, r, g, b);
+    EXPECT_EQ(r, 255);
+    EXPECT_EQ(b, 0);
+  }
+}
+
+TEST(QelRasterizerTest, BackFacesAreCulledUnlessClippingOpensTheShape) {
+  QelRenderScene scene;
+  QelMeshShape m;
+  m.vertices = {{-1, -1, 0}, {0, 1, 0}, {1, -1, 0}};  // clockwise seen from +z
+  m.triangles = {{0, 1, 2}};
+  scene.meshes.push_back({Shape(m), {}, {1, 1, 1}});
+  QelRenderView view = LookDownZ(10);
+  view.background = {0, 0, 0};
+  auto image = QelMakeVar<QelPixelImage>(16, 16);
+  QelRasterizer::Render(scene, view, *image);
+  EXPECT_FALSE(HasColor(*image, 255, 255, 255));
+  uint8_t r, g, b;
+  image->GetPixel(8, 8, r, g, b);
+  EXPECT_EQ(r, 0);
+  view.clipping.push_back(QelMathPlane({0, 0, 5}, {0, 0, 1}, {1, 0, 0}, {0, 1, 0}));
+  QelRasterizer::Render(scene, view, *image);
+  image->GetPixel(8, 8, r, g, b);
+  EXPECT_GT(r, 0) << "an opened shape shows its inside";
+}
+
+TEST(QelRasterizerTest, GoldenPictures) {
+  QelRenderScene scene;
+  scene.meshes.push_back({Shape(QelMeshShape::Box({-2, -1, -1}, {2, 1, 1})), {}, {0.62f, 0.66f, 0.72f}});
+  scene.meshes.push_back(
+      {Shape(QelMeshShape::Cylinder({0, 0, 1}, {0, 0, 2}, 0.6, 24)), {}, {0.80f, 0.72f, 0.55f}});
+  QelRenderView view;
+  view.eye = {6, -8, 6};
+  view.sight = QelMathPoint{0, 0, 0} - view.eye;
+  view.up = {0, 0, 1};
+  auto image = QelMakeVar<QelPixelImage>(96, 72);
+  QelRasterizer::Render(scene, view, *image);
+  ExpectLooksLike(*image, "001-box-and-cylinder.png");
+
+  view.clipping.push_back(QelMathPlane({0, 0, 0}, {0, -1, 0}, {1, 0, 0}, {0, 0, 1}));
+  QelRasterizer::Render(scene, view, *image);
+  ExpectLooksLike(*image, "002-clipped.png");
+
+  QelTextRenderer text;
+  if (!text.IsReady()) GTEST_SKIP() << text.Error();
+  QelRenderScene marks;
+  marks.annotations.push_back({{0, 0, 0}, {{-2, -1, 0}, {2, -1, 0}}, {0.85f, 0.1f, 0.1f}, "Flatness"});
+  view.clipping.clear();
+  view.text = &text;
+  auto large = QelMakeVar<QelPixelImage>(160, 90);
+  QelRasterizer::Render(marks, view, *large);
+  ExpectLooksLike(*large, "003-annotation.png");
+}
+
+TEST(QelPngWriterTest, RefusesAnUnwritablePathNamingIt) {
+  auto image = QelMakeVar<QelPixelImage>(4, 4);
+  std::string error;
+  EXPECT_FALSE(QelPngWriter::Write(*image, "/nonexistent-folder/x.png", error));
+  EXPECT_NE(error.find("/nonexistent-folder/x.png"), std::string::npos) << error;
+  std::string bytes;
+  ASSERT_TRUE(QelPngWriter::Encode(*image, bytes));
+  EXPECT_EQ(bytes.substr(1, 3), "PNG");
+}
