@@ -4,9 +4,13 @@
 #include <functional>
 #include <ostream>
 
+#include <dlfcn.h>
+
 #include "QelDlgNotify.h"
+#include "QelHostPictures.h"
 #include "QelHostSession.h"
 #include "QelModelPrinter.h"
+#include "QelReviewFramework.h"
 
 namespace {
 using Row = QelIRovFacetReview::Row;
@@ -161,6 +165,38 @@ bool Display(QelHostSession& session, const std::vector<std::string>& args, std:
   return true;
 }
 
+bool NeedModel(QelHostSession& session, std::string& error) {
+  if (session.Root()) return true;
+  error = "no model is open";
+  return false;
+}
+
+bool Thumbnail(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
+  if (!NeedArguments(args, 2, "a view or capture name (or \"*\") and a PNG file (or a folder for \"*\")", error) ||
+      !NeedModel(session, error))
+    return false;
+  QelReviewFramework::Register();
+  session.Out().flush();
+  // The plug-in is loaded globally, so the program's own handle finds its toolbox.
+  static void* const global = dlopen(nullptr, RTLD_NOW);
+  if (QelHostPictures::WriteThumbnails(global, session.Root(), args[0], args[1]) != 0) {
+    error = "thumbnail '" + args[0] + "' not written (see above)";
+    return false;
+  }
+  return true;
+}
+
+bool Picture(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
+  if (!NeedArguments(args, 1, "a PNG file", error) || !NeedModel(session, error)) return false;
+  QelReviewFramework::Register();
+  session.Out().flush();
+  if (QelHostPictures::WritePicture(session.Root(), session.Viewer(), args[0]) != 0) {
+    error = "picture not written (see above)";
+    return false;
+  }
+  return true;
+}
+
 bool Help(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
   if (!NeedArguments(args, 0, "no argument", error)) return false;
   for (const QelHostCommand& command : QelHostCommandTable()) {
@@ -186,6 +222,8 @@ std::vector<QelHostCommand>& QelHostCommandTable() {
       {"untick", "PATH", "untick a property by its label path", &Untick},
       {"answer", "yes|no", "answer the next confirmation question ahead", &Answer},
       {"display", "", "print the model with what is shown and hidden", &Display},
+      {"thumbnail", "NAME FILE", "write the thumbnail of a view or capture as PNG (NAME \"*\": all, into a folder)", &Thumbnail},
+      {"picture", "FILE", "write a picture of the whole model, as shown, as PNG", &Picture},
       {"help", "", "list the commands", &Help},
       {"quit", "", "end the session", &Quit},
   };

@@ -1,5 +1,9 @@
 #include "QelHostSession.h"
 
+#include "QelApplicationFrame.h"
+#include "QelFrmLayout.h"
+#include "QelModelScene.h"
+
 #include <editline/readline.h>
 
 #include <cstdlib>
@@ -43,6 +47,7 @@ QelHostSession::~QelHostSession() {
   QelDlgNotify::SetAsker(nullptr);
   if (displayCallback_) QelCallbackManager::Get().RemoveCallback(displayCallback_);
   review_ = nullptr;
+  if (window_) window_->SetViewer(nullptr);
 }
 
 bool QelHostSession::Open(const std::string& path, std::string& error) {
@@ -72,6 +77,21 @@ bool QelHostSession::Attach(const QelBaseUnknown_var& root, const std::string& n
         if (shownBefore_.emplace(held->GetImpl(), !IsShown(object)).second) changed_.push_back(held);
       });
   review_ = nullptr;
+  // The editor's 3D window, current in the frame's layout: what pictures are drawn from
+  // and where thumbnails take their view modes.
+  QelFrmLayout* layout = QelApplicationFrame::GetFrame()->GetLayout();
+  if (window_) {
+    window_->SetViewer(nullptr);
+    layout->RemoveWindow(window_.get());
+  }
+  auto window = QelMakeVar<Qel3DWindow>(editor.get());
+  auto viewer = QelMakeVar<Qel3DViewer>(800, 600);
+  viewer->SetSceneSource(QelMakeVar<QelModelScene>(root.get()).get());
+  window->SetViewer(viewer.get());
+  layout->AddWindow(window.get());
+  layout->SetCurrentWindow(window.get());
+  window_ = window;
+  viewer_ = viewer;
   root_ = root;
   editor_ = editor;
   review_ = review;

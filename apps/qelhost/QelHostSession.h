@@ -9,6 +9,8 @@
 #include <string>
 #include <vector>
 
+#include "Qel3DViewer.h"
+#include "Qel3DWindow.h"
 #include "QelCallbackManager.h"
 #include "QelFrmEditor.h"
 #include "QelIRovFacetReview.h"
@@ -42,6 +44,8 @@ class QelHostSession {
   std::ostream& Out() { return out_; }
   QelBaseUnknown* Root() const { return root_.get(); }
   QelIRovFacetReview* Review() const { return review_.get(); }
+  // The open model's 3D viewer, in the current window.
+  Qel3DViewer* Viewer() const { return viewer_.get(); }
 
   // Starts recording the display changes of the open model; EndChanges prints the objects
   // whose shown state differs from before, by name.
@@ -53,6 +57,8 @@ class QelHostSession {
   std::ostream& err_;
   QelBaseUnknown_var root_;
   QelVar<QelFrmEditor> editor_;
+  QelVar<Qel3DWindow> window_;
+  QelVar<Qel3DViewer> viewer_;
   QelVar<QelIRovFacetReview> review_;
   QelCallbackId displayCallback_ = 0;
   bool recording_ = false;
