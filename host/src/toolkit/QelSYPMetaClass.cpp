@@ -10,8 +10,9 @@
 
 namespace {
 std::map<std::string, std::unique_ptr<QelSYPMetaClass>>& Registry() {
-  static std::map<std::string, std::unique_ptr<QelSYPMetaClass>> registry;
-  return registry;
+  // Never destroyed: a module's unloader may still remove its classes during exit.
+  static auto* registry = new std::map<std::string, std::unique_ptr<QelSYPMetaClass>>();
+  return *registry;
 }
 
 // The toolkit's own classes have no properties of their own but are bases of others.
@@ -25,8 +26,8 @@ const QelSYPMetaClass* ToolkitClass(const std::string& name) {
 
 // Builders in the middle of Build, so a class whose builder asks for itself fails.
 std::map<std::string, bool>& Building() {
-  static std::map<std::string, bool> building;
-  return building;
+  static auto* building = new std::map<std::string, bool>();
+  return *building;
 }
 }  // namespace
 

@@ -13,8 +13,9 @@ struct Entry {
   std::string framework;
 };
 std::map<std::string, Entry>& Builders() {
-  static std::map<std::string, Entry> builders;
-  return builders;
+  // Never destroyed: a module's unloader may still remove its builders during exit.
+  static auto* builders = new std::map<std::string, Entry>();
+  return *builders;
 }
 }  // namespace
 
