@@ -16,6 +16,7 @@
 #include "QelRovFacetServices.h"
 #include "QelSampleProduct.h"
 #include "QelSettingRepository.h"
+#include "QelWidgetsPreview.h"
 
 namespace {
 constexpr const char* kModuleFramework = "QelTPSBrowserUIBase";
@@ -101,6 +102,7 @@ void* LoadPlugin(const QelHostOptions& options) {
 }  // namespace
 
 int main(int argc, char** argv) {
+  if (QelWidgetsPreviewWanted(argc, argv)) return QelWidgetsPreviewMain(argc, argv);
   QelHostOptions options;
   std::string error;
   if (!QelHostOptions::Parse(std::vector<std::string>(argv + 1, argv + argc), options, error)) {
