@@ -91,6 +91,8 @@ class QelSYPMetaClass {
   // type does not fit.
   bool GetProperty(QelBaseUnknown* object, const std::string& name, QelSYPValue& value) const;
   bool SetProperty(QelBaseUnknown* object, const std::string& name, const QelSYPValue& value) const;
+  // Reads one property of this table (or a base's) from `object`.
+  static bool Read(QelBaseUnknown* object, const Property& property, QelSYPValue& value);
   // A new handler bound to `object` for the named handler, or null.
   QelSYPEventHandler* CreateHandler(QelBaseUnknown* object, const std::string& name) const;
 

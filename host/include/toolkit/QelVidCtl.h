@@ -7,6 +7,7 @@
 #include <string>
 #include <vector>
 
+#include "QelSYPMetaClass.h"
 #include "QelVidWidget.h"
 
 class QelVidCtl : public QelVidWidget {
@@ -33,11 +34,11 @@ class QelVidCtl : public QelVidWidget {
   // Used by the style sheet while it instantiates a template.
   void SetTemplateRoot(QelVidWidget* root);
   void AddNamedPart(const std::string& name, QelVidWidget* part);
-  void AddBinding(QelVidWidget* part, const std::string& attribute, const std::string& property);
+  void AddBinding(QelVidWidget* part, const std::string& attribute, const QelSYPMetaClass::Property* property);
   struct Binding {
     QelVar<QelVidWidget> part;
     std::string attribute;
-    std::string property;
+    const QelSYPMetaClass::Property* property;  // owned by the class's table
   };
   const std::vector<Binding>& GetBindings() const { return bindings_; }
 

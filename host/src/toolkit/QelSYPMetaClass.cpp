@@ -7,6 +7,7 @@
 #include "QelSYPEventHandler.h"
 #include "QelSYPMetaClassBuilder.h"
 #include "QelVar.h"
+#include "QelVidStyleSheet.h"
 
 namespace {
 std::map<std::string, std::unique_ptr<QelSYPMetaClass>>& Registry() {
@@ -60,6 +61,8 @@ const QelSYPMetaClass* QelSYPMetaClass::Find(const std::string& className) {
 }
 
 void QelSYPMetaClass::RemoveFramework(const std::string& framework) {
+  // Compiled style templates point into the tables about to go.
+  QelVidStyleSheet::ClearCache();
   auto& registry = Registry();
   for (auto it = registry.begin(); it != registry.end();)
     it = it->second->GetFramework() == framework ? registry.erase(it) : std::next(it);
@@ -81,7 +84,12 @@ const QelSYPMetaClass::Handler* QelSYPMetaClass::FindHandler(const std::string& 
 
 bool QelSYPMetaClass::GetProperty(QelBaseUnknown* object, const std::string& name, QelSYPValue& value) const {
   const Property* p = FindProperty(name);
-  if (!p || !object) return false;
+  return p && Read(object, *p, value);
+}
+
+bool QelSYPMetaClass::Read(QelBaseUnknown* object, const Property& property, QelSYPValue& value) {
+  const Property* p = &property;
+  if (!object) return false;
   if (p->getInt) {
     value = p->getInt(object);
     return true;

@@ -1,6 +1,5 @@
 #include "QelVidCtl.h"
 
-#include "QelSYPMetaClass.h"
 #include "QelVidStyleSheet.h"
 
 const QelMetaObject& QelVidCtl::MetaObject() {
@@ -42,13 +41,11 @@ QelVidWidget* QelVidCtl::RetrieveSypNamedObject(const QelString& name) const {
 }
 
 void QelVidCtl::DispatchModifyProperty(const char* propertyName) {
-  const std::string wanted = propertyName ? propertyName : "";
-  const QelSYPMetaClass* meta = GetSYPMetaClass();
-  if (!meta) return;
+  const bool all = !propertyName || !*propertyName;
   for (const Binding& binding : bindings_) {
-    if (!wanted.empty() && binding.property != wanted) continue;
+    if (!all && binding.property->name != propertyName) continue;
     QelSYPValue value;
-    if (meta->GetProperty(this, binding.property, value)) binding.part->SetAttribute(binding.attribute, value);
+    if (QelSYPMetaClass::Read(this, *binding.property, value)) binding.part->SetAttribute(binding.attribute, value);
   }
 }
 
@@ -62,8 +59,9 @@ void QelVidCtl::AddNamedPart(const std::string& name, QelVidWidget* part) {
   if (part) parts_.emplace_back(name, QelVar<QelVidWidget>::Retain(part));
 }
 
-void QelVidCtl::AddBinding(QelVidWidget* part, const std::string& attribute, const std::string& property) {
-  if (part) bindings_.push_back({QelVar<QelVidWidget>::Retain(part), attribute, property});
+void QelVidCtl::AddBinding(QelVidWidget* part, const std::string& attribute,
+                           const QelSYPMetaClass::Property* property) {
+  if (part && property) bindings_.push_back({QelVar<QelVidWidget>::Retain(part), attribute, property});
 }
 
 void QelVidCtl::ClearTemplate() {

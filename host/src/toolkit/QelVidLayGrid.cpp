@@ -4,7 +4,7 @@
 
 int QelVidLayGrid::AddWidget(QelVidWidget* widget, const QelVidGridConstraints& constraints) {
   if (!widget || constraints.row < 0 || constraints.column < 0) return 0;
-  RemoveWidget(widget);
+  if (widget->GetParent() == this) RemoveWidget(widget);
   AddChild(widget);
   cells_.push_back({widget, constraints});
   return 1;

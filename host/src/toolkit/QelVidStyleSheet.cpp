@@ -2,6 +2,7 @@
 
 #include <fstream>
 #include <map>
+#include <optional>
 #include <nlohmann/json.hpp>
 #include <sstream>
 
@@ -27,18 +28,44 @@
 
 using nlohmann::json;
 
+// A style's template checked against one control class and kept, so that building the
+// thousandth row costs only its widgets: kinds, names, attribute values, resolved
+// properties and handlers, cells.
+struct QelVidCompiledPart {
+  std::string kind;
+  QelString name;
+  std::vector<std::pair<std::string, QelSYPValue>> attributes;
+  struct Binding {
+    std::string attribute;
+    const QelSYPMetaClass::Property* property;
+  };
+  std::vector<Binding> bindings;
+  struct Route {
+    QelSYPEvent* event;
+    std::string handler;
+  };
+  std::vector<Route> routes;
+  std::vector<QelVidCompiledPart> children;
+  std::vector<std::optional<QelVidGridConstraints>> cells;  // for a Grid's children
+  std::unique_ptr<QelVidCompiledPart> header;
+  std::unique_ptr<QelVidCompiledPart> body;
+};
+
 struct QelVidStyleSheet::Document {
   json root;
+  // Per style and control class; only templates that passed every check are kept.
+  std::map<std::pair<std::string, const QelSYPMetaClass*>, std::shared_ptr<const QelVidCompiledPart>> compiled;
 };
 
 namespace {
 std::map<std::string, std::unique_ptr<QelVidStyleSheet>>& Cache() {
-  static std::map<std::string, std::unique_ptr<QelVidStyleSheet>> cache;
-  return cache;
+  // Never destroyed: a module's unloader still clears it during exit.
+  static auto* cache = new std::map<std::string, std::unique_ptr<QelVidStyleSheet>>();
+  return *cache;
 }
 std::vector<std::string>& Diagnostics() {
-  static std::vector<std::string> diagnostics;
-  return diagnostics;
+  static auto* diagnostics = new std::vector<std::string>();
+  return *diagnostics;
 }
 
 struct StyleError {
@@ -100,121 +127,109 @@ QelSYPValue AttributeValue(const json& value, const std::string& place) {
   throw StyleError{place, "an attribute is a number, a text or a colour [r, g, b, a]"};
 }
 
-// Builds one template; parts, bindings and routes are only collected, so that a fault
-// anywhere leaves the control untouched.
-class TemplateBuilder {
+// Checks a template and compiles it; every fault throws with its place.
+class TemplateCompiler {
  public:
-  TemplateBuilder(QelVidCtl* control, const QelSYPMetaClass* meta) : control_(control), meta_(meta) {}
+  TemplateCompiler(const std::string& className, const QelSYPMetaClass* meta) : className_(className), meta_(meta) {}
 
-  QelVar<QelVidWidget> Build(const json& node, const std::string& place) {
+  QelVidCompiledPart Compile(const json& node, const std::string& place) {
     if (!node.is_object()) throw StyleError{place, "a part is an object"};
     for (const auto& [key, value] : node.items()) {
       static const char* known[] = {"kind", "name", "attributes", "bind", "on", "children", "cell", "header", "body"};
       if (std::find(std::begin(known), std::end(known), key) == std::end(known))
         throw StyleError{place + "/" + key, "unknown key"};
     }
+    QelVidCompiledPart part;
     auto kindIt = node.find("kind");
     if (kindIt == node.end() || !kindIt->is_string()) throw StyleError{place + "/kind", "missing or not a text"};
+    part.kind = kindIt->get<std::string>();
     std::string name;
     if (auto it = node.find("name"); it != node.end()) {
       if (!it->is_string()) throw StyleError{place + "/name", "not a text"};
       name = it->get<std::string>();
     }
-    QelVar<QelVidWidget> part = MakePart(kindIt->get<std::string>(), QelString(name));
-    if (!part) throw StyleError{place + "/kind", "unknown kind \"" + kindIt->get<std::string>() + "\""};
+    part.name = QelString(name);
+    // A sample of the kind answers which events it raises.
+    QelVar<QelVidWidget> sample = MakePart(part.kind, part.name);
+    if (!sample) throw StyleError{place + "/kind", "unknown kind \"" + part.kind + "\""};
     if (!name.empty()) {
-      for (const auto& [known, _] : parts_)
-        if (known == name) throw StyleError{place + "/name", "the part name \"" + name + "\" is used twice"};
-      parts_.emplace_back(name, part);
+      if (std::find(names_.begin(), names_.end(), name) != names_.end())
+        throw StyleError{place + "/name", "the part name \"" + name + "\" is used twice"};
+      names_.push_back(name);
     }
     if (auto it = node.find("attributes"); it != node.end()) {
       if (!it->is_object()) throw StyleError{place + "/attributes", "not an object"};
       for (const auto& [attribute, value] : it->items())
-        part->SetAttribute(attribute, AttributeValue(value, place + "/attributes/" + attribute));
+        part.attributes.emplace_back(attribute, AttributeValue(value, place + "/attributes/" + attribute));
     }
-    if (auto it = node.find("bind"); it != node.end()) BindAll(*it, part.get(), place + "/bind");
-    if (auto it = node.find("on"); it != node.end()) RouteAll(*it, part.get(), place + "/on");
-    BuildChildren(node, part.get(), place);
+    if (auto it = node.find("bind"); it != node.end()) BindAll(*it, part, place + "/bind");
+    if (auto it = node.find("on"); it != node.end()) RouteAll(*it, sample.get(), part, place + "/on");
+    CompileChildren(node, part, place);
     return part;
   }
 
-  void Apply() {
-    for (const auto& [name, part] : parts_) control_->AddNamedPart(name, part.get());
-    for (const auto& b : bindings_) control_->AddBinding(b.part.get(), b.attribute, b.property);
-    for (const auto& r : routes_) {
-      QelVar<QelSYPEventHandler> handler = QelVar<QelSYPEventHandler>::Adopt(meta_->CreateHandler(control_, r.handler));
-      if (handler) r.part->AddHandler(r.event, handler.get(), 0);
-    }
-  }
-
  private:
-  struct Route {
-    QelVar<QelVidWidget> part;
-    QelSYPEvent* event;
-    std::string handler;
-  };
-
   void NeedMeta(const std::string& place) const {
-    if (!meta_)
-      throw StyleError{place, std::string("the class ") + control_->IsA() + " has no introspection table"};
+    if (!meta_) throw StyleError{place, "the class " + className_ + " has no introspection table"};
   }
 
-  void BindAll(const json& bind, QelVidWidget* part, const std::string& place) {
+  void BindAll(const json& bind, QelVidCompiledPart& part, const std::string& place) {
     if (!bind.is_object()) throw StyleError{place, "not an object"};
     for (const auto& [attribute, property] : bind.items()) {
       const std::string at = place + "/" + attribute;
       if (!property.is_string()) throw StyleError{at, "a binding names a property"};
       NeedMeta(at);
-      if (!meta_->FindProperty(property.get<std::string>()))
+      const QelSYPMetaClass::Property* found = meta_->FindProperty(property.get<std::string>());
+      if (!found)
         throw StyleError{at, "the class " + meta_->GetClassName() + " has no property \"" +
                                  property.get<std::string>() + "\""};
-      bindings_.push_back({QelVar<QelVidWidget>::Retain(part), attribute, property.get<std::string>()});
+      part.bindings.push_back({attribute, found});
     }
   }
 
-  void RouteAll(const json& on, QelVidWidget* part, const std::string& place) {
+  void RouteAll(const json& on, QelVidWidget* sample, QelVidCompiledPart& part, const std::string& place) {
     if (!on.is_object()) throw StyleError{place, "not an object"};
     for (const auto& [eventName, handler] : on.items()) {
       const std::string at = place + "/" + eventName;
       if (!handler.is_string()) throw StyleError{at, "a route names a handler"};
-      QelSYPEvent* event = part->FindEvent(eventName);
+      QelSYPEvent* event = sample->FindEvent(eventName);
       if (!event)
-        throw StyleError{at, std::string("a ") + part->GetWidgetKind() + " raises no event \"" + eventName + "\""};
+        throw StyleError{at, std::string("a ") + sample->GetWidgetKind() + " raises no event \"" + eventName + "\""};
       NeedMeta(at);
       if (!meta_->FindHandler(handler.get<std::string>()))
         throw StyleError{at, "the class " + meta_->GetClassName() + " has no handler \"" +
                                  handler.get<std::string>() + "\""};
-      routes_.push_back({QelVar<QelVidWidget>::Retain(part), event, handler.get<std::string>()});
+      part.routes.push_back({event, handler.get<std::string>()});
     }
   }
 
-  void BuildChildren(const json& node, QelVidWidget* part, const std::string& place) {
-    auto* expander = dynamic_cast<QelVidCtlExpander*>(part);
+  void CompileChildren(const json& node, QelVidCompiledPart& part, const std::string& place) {
+    const bool expander = part.kind == "Expander";
     for (const char* slot : {"header", "body"}) {
       auto it = node.find(slot);
       if (it == node.end()) continue;
       if (!expander) throw StyleError{place + "/" + slot, "only an Expander has a header and a body"};
-      QelVar<QelVidWidget> child = Build(*it, place + "/" + slot);
-      if (std::string(slot) == "header") expander->SetHeader(child.get());
-      else expander->SetBody(child.get());
+      auto child = std::make_unique<QelVidCompiledPart>(Compile(*it, place + "/" + slot));
+      (std::string(slot) == "header" ? part.header : part.body) = std::move(child);
     }
     auto it = node.find("children");
     if (it == node.end()) return;
     if (!it->is_array()) throw StyleError{place + "/children", "not a list"};
     if (expander) throw StyleError{place + "/children", "an Expander has a header and a body, not children"};
-    auto* grid = dynamic_cast<QelVidLayGrid*>(part);
+    const bool grid = part.kind == "Grid";
     for (size_t i = 0; i < it->size(); ++i) {
       const std::string at = place + "/children/" + std::to_string(i);
-      QelVar<QelVidWidget> child = Build((*it)[i], at);
+      part.children.push_back(Compile((*it)[i], at));
+      auto cell = (*it)[i].find("cell");
       if (!grid) {
-        if ((*it)[i].contains("cell")) throw StyleError{at + "/cell", "only a Grid's children have a cell"};
-        part->AddChild(child.get());
+        if (cell != (*it)[i].end()) throw StyleError{at + "/cell", "only a Grid's children have a cell"};
+        part.cells.emplace_back();
         continue;
       }
       QelVidGridConstraints c;
       c.row = static_cast<int>(i);
-      if (auto cell = (*it)[i].find("cell"); cell != (*it)[i].end()) c = Cell(*cell, at + "/cell");
-      grid->AddWidget(child.get(), c);
+      if (cell != (*it)[i].end()) c = Cell(*cell, at + "/cell");
+      part.cells.emplace_back(c);
     }
   }
 
@@ -230,17 +245,33 @@ class TemplateBuilder {
     return {v[0], v[1], v[2], v[3], v[4], v[5], v[6], v[7]};
   }
 
-  QelVidCtl* control_;
+  std::string className_;
   const QelSYPMetaClass* meta_;
-  std::vector<std::pair<std::string, QelVar<QelVidWidget>>> parts_;
-  struct Binding {
-    QelVar<QelVidWidget> part;
-    std::string attribute;
-    std::string property;
-  };
-  std::vector<Binding> bindings_;
-  std::vector<Route> routes_;
+  std::vector<std::string> names_;
 };
+
+// Makes the widgets of a compiled template for `control`.
+QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* control, const QelSYPMetaClass* meta) {
+  QelVar<QelVidWidget> part = MakePart(compiled.kind, compiled.name);
+  if (!compiled.name.IsEmpty()) control->AddNamedPart(compiled.name.Str(), part.get());
+  for (const auto& [attribute, value] : compiled.attributes) part->SetAttribute(attribute, value);
+  for (const auto& binding : compiled.bindings) control->AddBinding(part.get(), binding.attribute, binding.property);
+  for (const auto& route : compiled.routes) {
+    QelVar<QelSYPEventHandler> handler = QelVar<QelSYPEventHandler>::Adopt(meta->CreateHandler(control, route.handler));
+    if (handler) part->AddHandler(route.event, handler.get(), 0);
+  }
+  if (auto* expander = dynamic_cast<QelVidCtlExpander*>(part.get())) {
+    if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta).get());
+    if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta).get());
+  }
+  auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
+  for (size_t i = 0; i < compiled.children.size(); ++i) {
+    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta);
+    if (grid && compiled.cells[i]) grid->AddWidget(child.get(), *compiled.cells[i]);
+    else part->AddChild(child.get());
+  }
+  return part;
+}
 }  // namespace
 
 QelVidStyleSheet::QelVidStyleSheet(std::string path, std::unique_ptr<Document> document)
@@ -299,26 +330,34 @@ std::vector<std::string> QelVidStyleSheet::StyleNames() const {
 
 HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& style) const {
   if (!control) return E_FAIL;
-  const json& styles = document_->root["styles"];
-  auto it = styles.find(style);
-  if (it == styles.end()) {
-    Report("style sheet " + path_ + ": style \"" + style + "\": no such style");
-    return E_FAIL;
+  const QelSYPMetaClass* meta = control->GetSYPMetaClass();
+  auto& compiled = document_->compiled[{style, meta}];
+  if (!compiled) {
+    const json& styles = document_->root["styles"];
+    auto it = styles.find(style);
+    if (it == styles.end()) {
+      document_->compiled.erase({style, meta});
+      Report("style sheet " + path_ + ": style \"" + style + "\": no such style");
+      return E_FAIL;
+    }
+    try {
+      if (!it->is_object() || !it->contains("template"))
+        throw StyleError{"/styles/" + style, "a style is an object with a \"template\""};
+      TemplateCompiler compiler(control->IsA(), meta);
+      compiled = std::make_shared<QelVidCompiledPart>(compiler.Compile((*it)["template"], "/styles/" + style + "/template"));
+    } catch (const StyleError& e) {
+      document_->compiled.erase({style, meta});
+      Report("style sheet " + path_ + ": style \"" + style + "\": at " + e.place + ": " + e.what);
+      return E_FAIL;
+    } catch (const json::exception& e) {
+      document_->compiled.erase({style, meta});
+      Report("style sheet " + path_ + ": style \"" + style + "\": " + e.what());
+      return E_FAIL;
+    }
   }
-  try {
-    if (!it->is_object() || !it->contains("template"))
-      throw StyleError{"/styles/" + style, "a style is an object with a \"template\""};
-    TemplateBuilder builder(control, control->GetSYPMetaClass());
-    QelVar<QelVidWidget> root = builder.Build((*it)["template"], "/styles/" + style + "/template");
-    control->SetTemplateRoot(root.get());
-    builder.Apply();
-  } catch (const StyleError& e) {
-    Report("style sheet " + path_ + ": style \"" + style + "\": at " + e.place + ": " + e.what);
-    return E_FAIL;
-  } catch (const json::exception& e) {
-    Report("style sheet " + path_ + ": style \"" + style + "\": " + e.what());
-    return E_FAIL;
-  }
+  std::shared_ptr<const QelVidCompiledPart> held = compiled;  // the map may change below
+  QelVar<QelVidWidget> root = BuildParts(*held, control, meta);
+  control->SetTemplateRoot(root.get());
   return S_OK;
 }
 
