@@ -5,7 +5,6 @@
 // dispatches events to its handlers and, for propagating events, to its ancestors'.
 // A dispatch holds every widget it will visit, so a handler may remove and release the
 // widget (or an ancestor) that is dispatching: it goes when the dispatch returns.
-#include <map>
 #include <string>
 #include <vector>
 
@@ -61,7 +60,9 @@ class QelVidWidget : public QelISYPIntrospectable {
   QelSYPValue GetAttribute(const std::string& name) const;
   int IntAttribute(const std::string& name, int fallback) const;
   QelUnicodeString TextAttribute(const std::string& name) const;
-  const std::map<std::string, QelSYPValue>& GetAttributes() const { return attributes_; }
+  // In order of first setting.
+  using Attributes = std::vector<std::pair<std::string, QelSYPValue>>;
+  const Attributes& GetAttributes() const { return attributes_; }
 
   // The resource name of the class at `level` (0: the class itself, 1: its base ...).
   virtual QelString GetResourceFilename(int level) const;
@@ -104,7 +105,9 @@ class QelVidWidget : public QelISYPIntrospectable {
   QelString name_;
   QelBaseUnknown_WR parent_;
   std::vector<QelVar<QelVidWidget>> children_;
-  std::map<std::string, QelSYPValue> attributes_;
+  // A few per widget: a flat list is cheaper to build than a tree.
+  Attributes attributes_;
+  const QelSYPValue* FindAttribute(const std::string& name) const;
   std::vector<Connection> connections_;
   QelVidPoint minimum_;
   bool layoutWhenUnvisible_ = true;

@@ -250,23 +250,32 @@ class TemplateCompiler {
   std::vector<std::string> names_;
 };
 
+// One handler per handler name serves every part routed to it.
+using HandlerCache = std::vector<std::pair<const std::string*, QelVar<QelSYPEventHandler>>>;
+
 // Makes the widgets of a compiled template for `control`.
-QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* control, const QelSYPMetaClass* meta) {
+QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* control, const QelSYPMetaClass* meta,
+                                HandlerCache& handlers) {
   QelVar<QelVidWidget> part = MakePart(compiled.kind, compiled.name);
   if (!compiled.name.IsEmpty()) control->AddNamedPart(compiled.name.Str(), part.get());
   for (const auto& [attribute, value] : compiled.attributes) part->SetAttribute(attribute, value);
   for (const auto& binding : compiled.bindings) control->AddBinding(part.get(), binding.attribute, binding.property);
   for (const auto& route : compiled.routes) {
-    QelVar<QelSYPEventHandler> handler = QelVar<QelSYPEventHandler>::Adopt(meta->CreateHandler(control, route.handler));
-    if (handler) part->AddHandler(route.event, handler.get(), 0);
+    auto it = std::find_if(handlers.begin(), handlers.end(), [&](const auto& h) { return *h.first == route.handler; });
+    if (it == handlers.end()) {
+      handlers.emplace_back(&route.handler,
+                            QelVar<QelSYPEventHandler>::Adopt(meta->CreateHandler(control, route.handler)));
+      it = std::prev(handlers.end());
+    }
+    if (it->second) part->AddHandler(route.event, it->second.get(), 0);
   }
   if (auto* expander = dynamic_cast<QelVidCtlExpander*>(part.get())) {
-    if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta).get());
-    if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta).get());
+    if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta, handlers).get());
+    if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta, handlers).get());
   }
   auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
   for (size_t i = 0; i < compiled.children.size(); ++i) {
-    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta);
+    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta, handlers);
     if (grid && compiled.cells[i]) grid->AddWidget(child.get(), *compiled.cells[i]);
     else part->AddChild(child.get());
   }
@@ -356,7 +365,8 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
     }
   }
   std::shared_ptr<const QelVidCompiledPart> held = compiled;  // the map may change below
-  QelVar<QelVidWidget> root = BuildParts(*held, control, meta);
+  HandlerCache handlers;
+  QelVar<QelVidWidget> root = BuildParts(*held, control, meta, handlers);
   control->SetTemplateRoot(root.get());
   return S_OK;
 }

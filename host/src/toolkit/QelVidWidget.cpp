@@ -56,25 +56,33 @@ QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
 }
 
 void QelVidWidget::SetAttribute(const std::string& name, const QelSYPValue& value) {
-  attributes_[name] = value;
+  auto it = std::find_if(attributes_.begin(), attributes_.end(), [&](const auto& a) { return a.first == name; });
+  if (it == attributes_.end()) attributes_.emplace_back(name, value);
+  else it->second = value;
   OnAttributeChanged(name);
 }
 
+const QelSYPValue* QelVidWidget::FindAttribute(const std::string& name) const {
+  for (const auto& [key, value] : attributes_)
+    if (key == name) return &value;
+  return nullptr;
+}
+
 QelSYPValue QelVidWidget::GetAttribute(const std::string& name) const {
-  auto it = attributes_.find(name);
-  return it == attributes_.end() ? QelSYPValue() : it->second;
+  const QelSYPValue* found = FindAttribute(name);
+  return found ? *found : QelSYPValue();
 }
 
 int QelVidWidget::IntAttribute(const std::string& name, int fallback) const {
-  auto it = attributes_.find(name);
-  return it == attributes_.end() ? fallback : QelSYPValueToInt(it->second, fallback);
+  const QelSYPValue* found = FindAttribute(name);
+  return found ? QelSYPValueToInt(*found, fallback) : fallback;
 }
 
 QelUnicodeString QelVidWidget::TextAttribute(const std::string& name) const {
-  auto it = attributes_.find(name);
-  if (it == attributes_.end()) return {};
-  if (const auto* text = std::get_if<QelUnicodeString>(&it->second)) return *text;
-  return QelUnicodeString(QelSYPValueToText(it->second));
+  const QelSYPValue* found = FindAttribute(name);
+  if (!found) return {};
+  if (const auto* text = std::get_if<QelUnicodeString>(found)) return *text;
+  return QelUnicodeString(QelSYPValueToText(*found));
 }
 
 QelString QelVidWidget::GetResourceFilename(int) const { return QelString("QelVidWidget"); }
