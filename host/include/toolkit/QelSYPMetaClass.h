@@ -3,6 +3,7 @@
 // type, getter, optional setter: no setter means read-only), its event handlers (name,
 // argument type, handler factory), a creation function and a base meta class. Made by a
 // builder (QelSYPMetaClassBuilder), then kept until the framework that built it unloads.
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -75,6 +76,8 @@ class QelSYPMetaClass {
   static const QelSYPMetaClass* Find(const std::string& className);
   // Forgets the classes a framework built (its getters would dangle once it unloads).
   static void RemoveFramework(const std::string& framework);
+  // Keeps a table made by a builder, replacing one of the same class name.
+  static const QelSYPMetaClass* Register(std::unique_ptr<QelSYPMetaClass> metaClass);
 
   const std::string& GetClassName() const { return className_; }
   const std::string& GetFramework() const { return framework_; }

@@ -132,9 +132,9 @@ QelSYPEventHandler* QelSYPMetaClass::CreateHandler(QelBaseUnknown* object, const
   return h && h->factory ? h->factory(object) : nullptr;
 }
 
-// Kept here so the registry has one owner: the builder hands its table over.
-void QelSYPMetaClassRegister(std::unique_ptr<QelSYPMetaClass> metaClass);
-void QelSYPMetaClassRegister(std::unique_ptr<QelSYPMetaClass> metaClass) {
-  std::string name = metaClass->GetClassName();
-  Registry()[name] = std::move(metaClass);
+const QelSYPMetaClass* QelSYPMetaClass::Register(std::unique_ptr<QelSYPMetaClass> metaClass) {
+  if (!metaClass) return nullptr;
+  std::unique_ptr<QelSYPMetaClass>& slot = Registry()[metaClass->GetClassName()];
+  slot = std::move(metaClass);
+  return slot.get();
 }

@@ -5,8 +5,6 @@
 
 #include "QelAssert.h"
 
-void QelSYPMetaClassRegister(std::unique_ptr<QelSYPMetaClass> metaClass);
-
 namespace {
 struct Entry {
   QelSYPMetaClassBuilder::Creator creator;
@@ -91,6 +89,5 @@ void QelSYPMetaClassBuilder::CreateMetaClass(QelSYPCreateFunction create, const 
   if (baseMetaClass && !base) QelAssertPointer(baseMetaClass);
   auto made = std::make_unique<QelSYPMetaClass>(className_, framework_, std::move(properties_), std::move(handlers_),
                                                 create, base);
-  made_ = made.get();
-  QelSYPMetaClassRegister(std::move(made));
+  made_ = QelSYPMetaClass::Register(std::move(made));
 }
