@@ -56,11 +56,13 @@ void QelVidCtl::SetTemplateRoot(QelVidWidget* root) {
 }
 
 void QelVidCtl::AddNamedPart(const std::string& name, QelVidWidget* part) {
+  if (parts_.empty()) parts_.reserve(8);
   if (part) parts_.emplace_back(name, QelVar<QelVidWidget>::Retain(part));
 }
 
 void QelVidCtl::AddBinding(QelVidWidget* part, const std::string& attribute,
                            const QelSYPMetaClass::Property* property) {
+  if (bindings_.empty()) bindings_.reserve(8);
   if (part && property) bindings_.push_back({QelVar<QelVidWidget>::Retain(part), attribute, property});
 }
 

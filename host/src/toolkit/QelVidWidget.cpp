@@ -34,6 +34,7 @@ void QelVidWidget::AddChild(QelVidWidget* child) {
   QelVar<QelVidWidget> keep = QelVar<QelVidWidget>::Retain(child);
   if (QelVidWidget* old = child->GetParent()) old->RemoveChild(child);
   child->parent_ = QelBaseUnknown_WR(this);
+  if (children_.empty()) children_.reserve(4);
   children_.push_back(std::move(keep));
 }
 
@@ -56,6 +57,8 @@ QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
 }
 
 void QelVidWidget::SetAttribute(const std::string& name, const QelSYPValue& value) {
+  // Most widgets carry a handful: one allocation instead of a growth series.
+  if (attributes_.empty()) attributes_.reserve(4);
   auto it = std::find_if(attributes_.begin(), attributes_.end(), [&](const auto& a) { return a.first == name; });
   if (it == attributes_.end()) attributes_.emplace_back(name, value);
   else it->second = value;
@@ -112,6 +115,7 @@ QelSYPEvent* QelVidWidget::FindEvent(const std::string& name) const {
 
 int QelVidWidget::AddHandler(QelSYPEvent* event, QelSYPEventHandler* handler, int) {
   if (!event || !handler) return 0;
+  if (connections_.empty()) connections_.reserve(2);
   connections_.push_back({event, QelVar<QelSYPEventHandler>::Retain(handler)});
   return 1;
 }
