@@ -21,6 +21,7 @@
 #include "QelRovFacetServices.h"
 #include "QelSampleProduct.h"
 #include "QelSettingRepository.h"
+#include "QelWidgetsPreview.h"
 
 namespace {
 constexpr const char* kModuleFramework = "QelTPSBrowserUIBase";
@@ -135,6 +136,7 @@ int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
 }  // namespace
 
 int main(int argc, char** argv) {
+  if (QelWidgetsPreviewWanted(argc, argv)) return QelWidgetsPreviewMain(argc, argv);
   QelHostOptions options;
   std::string error;
   if (int code = 0; QelHostPictures::Run(std::vector<std::string>(argv + 1, argv + argc), options.modulePath,

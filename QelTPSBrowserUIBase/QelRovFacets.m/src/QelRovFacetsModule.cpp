@@ -26,6 +26,9 @@
 #include "QelRovFacetPropertyGroup.h"
 #include "QelRovFacetPropertyItem.h"
 #include "QelRovFacetsFactories.h"
+#include "QelRovRefinementFacetSYPIntro.h"
+#include "QelRovRefinementPropertySYPIntro.h"
+#include "QelSYPMetaClassBuilder.h"
 
 extern "C" const char* QelRovFacetsModuleName() { return "QelRovFacets"; }
 
@@ -77,13 +80,22 @@ void QelRovFacetsRegister() {
   DescribeInterface<QelITPSLightSet>("QelITPSLightSet");
   DescribeInterface<QelILumLightLoadModeObserver>("QelILumLightLoadModeObserver");
   DescribeInterface<QelITPSLight>("QelITPSLight");
+
+  // The introspection builders of the panel widgets.
+  QelSYPMetaClassBuilder::Register("QelRovRefinementFacetSYPMetaClassBuilder",
+                                   &fctCreateQelRovRefinementFacetSYPMetaClassBuilder, kFramework);
+  QelSYPMetaClassBuilder::Register("QelRovRefinementPropertySYPMetaClassBuilder",
+                                   &fctCreateQelRovRefinementPropertySYPMetaClassBuilder, kFramework);
 }
 
 // Registers at load and takes every entry back at unload, so that no dictionary entry
 // outlives the factories it points into.
 struct QelRovFacetsLoader {
   QelRovFacetsLoader() { QelRovFacetsRegister(); }
-  ~QelRovFacetsLoader() { QelDictionary::Get().RemoveFramework(kFramework); }
+  ~QelRovFacetsLoader() {
+    QelDictionary::Get().RemoveFramework(kFramework);
+    QelSYPMetaClassBuilder::RemoveFramework(kFramework);
+  }
 };
 const QelRovFacetsLoader g_loader;
 }  // namespace

@@ -1,0 +1,6 @@
+#pragma once
+// Introspection table of QelRovRefinementFacet, registered under
+// "QelRovRefinementFacetSYPMetaClassBuilder".
+#include "QelBaseUnknown.h"
+
+extern "C" QelBaseUnknown* fctCreateQelRovRefinementFacetSYPMetaClassBuilder();

@@ -1,0 +1,6 @@
+#pragma once
+// Introspection table of QelRovRefinementProperty, registered under
+// "QelRovRefinementPropertySYPMetaClassBuilder".
+#include "QelBaseUnknown.h"
+
+extern "C" QelBaseUnknown* fctCreateQelRovRefinementPropertySYPMetaClassBuilder();

@@ -1,0 +1,141 @@
+#include "QelRovRefinementFacet.h"
+
+#include "QelAssert.h"
+#include "QelListValQelBaseUnknown_var.h"
+#include "QelRovFacet.h"
+#include "QelRovFacetProperty.h"
+#include "QelRovRefinementProperty.h"
+#include "QelSYPEventFactory.h"
+#include "QelSYPWRefMethEventHandler.h"
+#include "QelToolkitCheck.h"
+#include "QelVidCtlExpander.h"
+#include "QelVidGridConstraints.h"
+#include "QelVidLayGrid.h"
+#include "QelVidSpacer.h"
+
+const QelMetaObject& QelRovRefinementFacet::MetaObject() {
+  static const QelMetaObject& meta = QelMetaObject::Declare(
+      "QelRovRefinementFacet", QelMetaKind::Implementation, &QelVidCtl::MetaObject(), "QelTPSBrowserUIBase");
+  return meta;
+}
+const QelMetaObject* QelRovRefinementFacet::GetMetaObject() const { return &MetaObject(); }
+
+QelRovRefinementFacet::QelRovRefinementFacet() : QelVidCtl(nullptr, QelString()) {}
+
+QelRovRefinementFacet::QelRovRefinementFacet(QelVidWidget* parent, const QelString& name, QelBaseUnknown* facet)
+    : QelVidCtl(parent, name), facet_(facet) {
+  QelBaseUnknown_var hold;
+  QelRovFacet* resolved = ResolveFacet(hold);
+  if (!resolved) return;
+  resolved->GetFacetName(facetName_);
+  SetCustomStyle(QelString("QelRovRefinementFacet.sypstyle"), QelString("Default"), QelString(""));
+}
+
+QelRovRefinementFacet::~QelRovRefinementFacet() = default;
+
+QelString QelRovRefinementFacet::GetResourceFilename(int level) const {
+  if (level <= 0) return QelString("QelRovRefinementFacet");
+  return QelVidCtl::GetResourceFilename(level - 1);
+}
+
+QelRovFacet* QelRovRefinementFacet::ResolveFacet(QelBaseUnknown_var& hold) const {
+  hold = facet_.Get();
+  if (!hold) {
+    QelAssertNullHandler();
+    return nullptr;
+  }
+  auto* facet = QelSysDynamicCast<QelRovFacet>(hold.get());
+  if (!facet) QelAssertPointer();
+  return facet;
+}
+
+void QelRovRefinementFacet::OnTemplateApplied() {
+  auto* expander = dynamic_cast<QelVidCtlExpander*>(RetrieveSypNamedObject(QelString("ExpanderFacet")));
+  if (!expander) {
+    QelAssertPointer();
+    return;
+  }
+  expander->SetName(QelString(facetName_.Utf8()));
+  QelBaseUnknown_var hold;
+  QelRovFacet* facet = ResolveFacet(hold);
+  if (!facet) return;
+  bool expanded = false;
+  facet->GetExpandedFlag(expanded);
+  expander->SetExpandedState(expanded);
+  grid_ = dynamic_cast<QelVidLayGrid*>(RetrieveSypNamedObject(QelString("GridFacet")));
+}
+
+HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
+  QelBaseUnknown_var hold;
+  QelRovFacet* facet = ResolveFacet(hold);
+  if (!facet) return E_UNEXPECTED;
+  if (!grid_) {
+    QelAssertPointer();
+    return E_UNEXPECTED;
+  }
+  QelListValQelBaseUnknown_var properties;
+  facet->GetProperties(properties);
+  const int n = properties.Size();
+  const std::string baseName = facetName_.Utf8() + "_Property";
+  int hidden = 0;
+  for (int i = 1; i <= n; ++i) {
+    QelBaseUnknown* property = properties[i].get();
+    // Hidden rows do not break the alternation of the rows shown.
+    const bool alternate = (i - hidden) % 2 == 0;
+    QelVar<QelRovRefinementProperty> widget = QelMakeVar<QelRovRefinementProperty>(
+        this, QelString(baseName + std::to_string(i - 1)), property, alternate);
+    if (QelFailed(widget->BuildContent())) {
+      QelAssertBool();
+      continue;
+    }
+    QelSYPWRefMethEventHandler<QelRovRefinementFacet>::Connect(widget.get(), QelRovRefinementProperty::SendPropEvent(),
+                                                               this, &QelRovRefinementFacet::ForwardPropertyEvent);
+    grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
+    auto* facetProperty = QelSysDynamicCast<QelRovFacetProperty>(property);
+    if (facetProperty && !facetProperty->GetVisibleFlag()) {
+      ++hidden;
+      widget->SetVisibleFlag(0);
+      widget->SetLayoutWhenUnvisibleFlag(0);
+    }
+  }
+  // The spacer shares the last property's row. Without properties there is no such row:
+  // the grid refuses row -1 and stays empty.
+  QelVar<QelVidSpacer> spacer = QelMakeVar<QelVidSpacer>(this, QelString("Spacer"));
+  grid_->AddWidget(spacer.get(), QelVidGridConstraints{0, n - 1, 1, 1, 1, 1, 1, 1});
+  grid_->SetRowWeight(n - 1, 1.0);
+  return S_OK;
+}
+
+QelSYPEvent* QelRovRefinementFacet::SendFacetEvent() {
+  static QelSYPEvent* event = nullptr;
+  if (!event) {
+    QelSYPEventFactory* pEventFactory = QelVidWidget::GetEventFactory();
+    if (!QelTkCheckPointer(pEventFactory, "pEventFactory")) return nullptr;
+    event = pEventFactory->NewEvent("SendFacetEvent", QelSYPEvent::Ancestors, "QelSYPEventArgs", &MetaObject());
+  }
+  return event;
+}
+
+void QelRovRefinementFacet::ForwardPropertyEvent(QelBaseUnknown*, QelSYPEventArgs*) {
+  QelVar<QelSYPEventArgs> args = QelMakeVar<QelSYPEventArgs>(SendFacetEvent());
+  args->SetOrigin(this);
+  if (!Dispatch(args.get())) QelAssertBool();
+}
+
+int QelRovRefinementFacet::GetExpandedFlag() const {
+  QelBaseUnknown_var hold = facet_.Get();
+  auto* facet = QelSysDynamicCast<QelRovFacet>(hold.get());
+  bool expanded = false;
+  if (facet) facet->GetExpandedFlag(expanded);
+  return expanded ? 1 : 0;
+}
+
+void QelRovRefinementFacet::OnExpanderExpanded(QelBaseUnknown*, QelSYPEventArgs*) {
+  QelBaseUnknown_var hold;
+  if (QelRovFacet* facet = ResolveFacet(hold)) facet->SetExpandedFlag(true);
+}
+
+void QelRovRefinementFacet::OnExpanderCollapsed(QelBaseUnknown*, QelSYPEventArgs*) {
+  QelBaseUnknown_var hold;
+  if (QelRovFacet* facet = ResolveFacet(hold)) facet->SetExpandedFlag(false);
+}

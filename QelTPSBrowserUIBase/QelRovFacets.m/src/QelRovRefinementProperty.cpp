@@ -1,0 +1,350 @@
+#include "QelRovRefinementProperty.h"
+
+#include "QelAssert.h"
+#include "QelBoxingOfQelVidColor.h"
+#include "QelListValQelBaseUnknown_var.h"
+#include "QelRovFacetProperty.h"
+#include "QelSYP.h"
+#include "QelSYPEventFactory.h"
+#include "QelToolkitCheck.h"
+#include "QelVidCtlExpander.h"
+#include "QelVidCtlImageAndLabelCombo.h"
+#include "QelVidCtlLineEditor.h"
+#include "QelVidGridConstraints.h"
+#include "QelVidLayGrid.h"
+
+namespace {
+constexpr const char* kSheet = "QelRovRefinementProperty.sypstyle";
+// Combo line index -> QelPropertyOperator.
+constexpr QelPropertyOperator kLeftOperators[] = {QelPropertyOperatorEqual, QelPropertyOperatorGreater,
+                                                  QelPropertyOperatorGreaterOrEqual};
+constexpr QelPropertyOperator kRightOperators[] = {QelPropertyOperatorLess, QelPropertyOperatorLessOrEqual};
+constexpr const char* kLeftTexts[] = {"=", "<", "<="};
+constexpr const char* kRightTexts[] = {"<", "<="};
+
+int IndexOf(const QelPropertyOperator* table, int size, int op) {
+  for (int i = 0; i < size; ++i)
+    if (table[i] == op) return i;
+  return -1;
+}
+}  // namespace
+
+const QelMetaObject& QelRovRefinementProperty::MetaObject() {
+  static const QelMetaObject& meta = QelMetaObject::Declare(
+      "QelRovRefinementProperty", QelMetaKind::Implementation, &QelVidCtl::MetaObject(), "QelTPSBrowserUIBase");
+  return meta;
+}
+const QelMetaObject* QelRovRefinementProperty::GetMetaObject() const { return &MetaObject(); }
+
+QelRovRefinementProperty::QelRovRefinementProperty() : QelVidCtl(nullptr, QelString()) {}
+
+QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, const QelString& name,
+                                                   QelBaseUnknown* property, bool alternate)
+    : QelVidCtl(parent, name), property_(property), alternate_(alternate) {
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* resolved = ResolveProperty(hold);
+  if (!resolved) return;
+  resolved->GetName(propertyName_);
+  resolved->IsChecked(checked_);
+  QelListValQelBaseUnknown_var children;
+  resolved->GetChildren(children);
+  childCount_ = children.Size();
+  const char* style = "SingleElementStyle";
+  kind_ = KindSingleElement;
+  if (childCount_ > 0) {
+    kind_ = KindExpander;
+    style = "ExpanderStyle";
+  } else if (resolved->GetFlags() & QelRovFacetProperty::FlagValueRange) {
+    kind_ = KindRange;
+    style = "RangeStyle";
+  }
+  SetCustomStyle(QelString(kSheet), QelString(style), QelString(""));
+}
+
+QelRovRefinementProperty::~QelRovRefinementProperty() = default;
+
+QelString QelRovRefinementProperty::GetResourceFilename(int level) const {
+  if (level <= 0) return QelString("QelRovRefinementProperty");
+  return QelVidCtl::GetResourceFilename(level - 1);
+}
+
+QelRovFacetProperty* QelRovRefinementProperty::ResolveProperty(QelBaseUnknown_var& hold) const {
+  hold = property_.Get();
+  if (!hold) {
+    QelAssertNullHandler();
+    return nullptr;
+  }
+  auto* property = QelSysDynamicCast<QelRovFacetProperty>(hold.get());
+  if (!property) QelAssertPointer();
+  return property;
+}
+
+void QelRovRefinementProperty::OnTemplateApplied() {
+  if (kind_ == KindExpander) {
+    auto* expander = dynamic_cast<QelVidCtlExpander*>(RetrieveSypNamedObject(QelString("ExpanderProp")));
+    if (!expander) {
+      QelAssertPointer();
+      return;
+    }
+    expander->SetName(QelString(propertyName_.Utf8() + "_Expander"));
+    QelBaseUnknown_var hold;
+    QelRovFacetProperty* property = ResolveProperty(hold);
+    if (!property) return;
+    bool expanded = false;
+    property->GetExpandedFlag(expanded);
+    expander->SetExpandedState(expanded);
+    grid_ = dynamic_cast<QelVidLayGrid*>(RetrieveSypNamedObject(QelString("GridProp")));
+  } else if (kind_ == KindRange) {
+    leftCombo_ = dynamic_cast<QelVidCtlImageAndLabelCombo*>(RetrieveSypNamedObject(QelString("LeftCombo")));
+    if (!leftCombo_) {
+      QelAssertPointer();
+      return;
+    }
+    rightCombo_ = dynamic_cast<QelVidCtlImageAndLabelCombo*>(RetrieveSypNamedObject(QelString("RightCombo")));
+    if (!rightCombo_) QelAssertPointer();
+  }
+}
+
+HRESULT QelRovRefinementProperty::BuildContent() {
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* property = ResolveProperty(hold);
+  if (!property) return E_UNEXPECTED;
+  if (kind_ == KindExpander) return BuildSubPropertyWidgets(property);
+  if (kind_ == KindRange) return BuildRange(property);
+  return S_OK;
+}
+
+HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* property) {
+  if (!grid_) {
+    QelAssertPointer();
+    return E_UNEXPECTED;
+  }
+  QelListValQelBaseUnknown_var children;
+  property->GetChildren(children);
+  const std::string baseName = propertyName_.Utf8() + "_Property";
+  int hidden = 0;
+  for (int i = 1; i <= children.Size(); ++i) {
+    QelBaseUnknown* child = children[i].get();
+    const bool alternate = (i - hidden) % 2 == 0;
+    QelVar<QelRovRefinementProperty> widget = QelMakeVar<QelRovRefinementProperty>(
+        this, QelString(baseName + std::to_string(i - 1)), child, alternate);
+    if (QelFailed(widget->BuildContent())) {
+      QelAssertBool();
+      continue;
+    }
+    grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
+    auto* childProperty = QelSysDynamicCast<QelRovFacetProperty>(child);
+    if (childProperty && !childProperty->GetVisibleFlag()) {
+      ++hidden;
+      widget->SetVisibleFlag(0);
+      widget->SetLayoutWhenUnvisibleFlag(0);
+    }
+  }
+  return S_OK;
+}
+
+HRESULT QelRovRefinementProperty::BuildRange(QelRovFacetProperty* property) {
+  if (!leftCombo_ || !rightCombo_) {
+    QelAssertPointer();
+    return E_UNEXPECTED;
+  }
+  leftCombo_->ClearLines();
+  for (const char* text : kLeftTexts) leftCombo_->SetLine(QelUnicodeString(text), nullptr, -1, 0);
+  rightCombo_->ClearLines();
+  for (const char* text : kRightTexts) rightCombo_->SetLine(QelUnicodeString(text), nullptr, -1, 0);
+
+  // Operators outside both tables, so a range that cannot be read is refused below.
+  auto leftOp = static_cast<QelPropertyOperator>(-1);
+  auto rightOp = static_cast<QelPropertyOperator>(-1);
+  double* left = nullptr;
+  double* right = nullptr;
+  property->GetToleranceValues(leftOp, left, rightOp, right);
+  if (left) leftValue_ = *left;
+  if (right) rightValue_ = *right;
+  QelSYPNotifyPropertyChange(this, "LeftValue");
+  QelSYPNotifyPropertyChange(this, "RightValue");
+
+  const int leftIndex = IndexOf(kLeftOperators, 3, leftOp);
+  const int rightIndex = IndexOf(kRightOperators, 2, rightOp);
+  if (leftIndex < 0 || rightIndex < 0) {
+    QelAssertBool();
+    return E_UNEXPECTED;
+  }
+  leftOperatorIndex_ = leftIndex;
+  rightOperatorIndex_ = rightIndex;
+  leftCombo_->SetSelectedIndex(leftIndex);
+  rightCombo_->SetSelectedIndex(rightIndex);
+  rangeApplied_ = true;
+  QelSYP::LoadResources(this);
+  return S_OK;
+}
+
+void QelRovRefinementProperty::SetChecked(int value) {
+  if (kind_ == KindRange && !rangeApplied_ && leftValue_ > 0.0 &&
+      (leftOperatorIndex_ == 0 || (rightValue_ > 0.0 && rightValue_ >= leftValue_)))
+    OnRangeUpdate(nullptr, nullptr);
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* property = ResolveProperty(hold);
+  if (!property) return;
+  property->SetCheck(value == 1);
+  QelVar<QelSYPEventArgs> args = QelMakeVar<QelSYPEventArgs>(SendPropEvent());
+  args->SetOrigin(this);
+  if (!Dispatch(args.get())) QelAssertBool();
+}
+
+QelSYPEvent* QelRovRefinementProperty::SendPropEvent() {
+  static QelSYPEvent* event = nullptr;
+  if (!event) {
+    QelSYPEventFactory* pEventFactory = QelVidWidget::GetEventFactory();
+    if (!QelTkCheckPointer(pEventFactory, "pEventFactory")) return nullptr;
+    event = pEventFactory->NewEvent("SendPropEvent", QelSYPEvent::Ancestors, "QelSYPEventArgs", &MetaObject());
+  }
+  return event;
+}
+
+QelBaseUnknown* QelRovRefinementProperty::GetLineColor() const {
+  if (hovered_) return QelBoxingOfQelVidColor::Box(QelVidColor(106, 158, 190, 100));
+  return QelBoxingOfQelVidColor::Box(
+      QelVidColor(alternate_ ? 0.1 : 0.0, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2)));
+}
+
+QelBaseUnknown* QelRovRefinementProperty::GetBorderColor() const {
+  if (hovered_) return QelBoxingOfQelVidColor::Box(QelVidColor(33, 110, 159, 120));
+  return QelBoxingOfQelVidColor::Box(QelVidColor(0.0, 0, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2)));
+}
+
+int QelRovRefinementProperty::GetIconVisibility() const { return GetIcon().IsEmpty() ? 0 : 1; }
+
+int QelRovRefinementProperty::GetExpandedFlag() const {
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* property = ResolveProperty(hold);
+  bool expanded = false;
+  if (property) property->GetExpandedFlag(expanded);
+  return expanded ? 1 : 0;
+}
+
+int QelRovRefinementProperty::GetCheckBoxVisibility() const {
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* property = ResolveProperty(hold);
+  if (!property) return 0;
+  return (property->GetFlags() & QelRovFacetProperty::FlagRadio) ? 0 : 1;
+}
+
+int QelRovRefinementProperty::GetRadioVisibility() const {
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* property = ResolveProperty(hold);
+  if (!property) return 0;
+  return (property->GetFlags() & QelRovFacetProperty::FlagRadio) ? 1 : 0;
+}
+
+int QelRovRefinementProperty::GetRangeButtonEnableFlag() const {
+  return checked_ && !rangeApplied_ && (leftOperatorIndex_ == 0 || rightValue_ >= leftValue_) ? 1 : 0;
+}
+
+QelUnicodeString QelRovRefinementProperty::GetIcon() const {
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* property = ResolveProperty(hold);
+  QelUnicodeString icon;
+  if (property) property->GetIconName(icon);
+  return icon;
+}
+
+QelUnicodeString QelRovRefinementProperty::GetLeftValue() const {
+  QelUnicodeString text;
+  text.BuildFromNum(leftValue_, "%g");
+  return text;
+}
+
+QelUnicodeString QelRovRefinementProperty::GetRightValue() const {
+  QelUnicodeString text;
+  text.BuildFromNum(rightValue_, "%g");
+  return text;
+}
+
+void QelRovRefinementProperty::OnClick(QelBaseUnknown*, QelSYPEventArgs*) {
+  checked_ = !checked_;
+  SetChecked(checked_ ? 1 : 0);
+}
+
+void QelRovRefinementProperty::OnExpanderExpanded(QelBaseUnknown*, QelSYPEventArgs*) {
+  QelBaseUnknown_var hold;
+  if (QelRovFacetProperty* property = ResolveProperty(hold)) property->SetExpandedFlag(true);
+}
+
+void QelRovRefinementProperty::OnExpanderCollapsed(QelBaseUnknown*, QelSYPEventArgs*) {
+  QelBaseUnknown_var hold;
+  if (QelRovFacetProperty* property = ResolveProperty(hold)) property->SetExpandedFlag(false);
+}
+
+void QelRovRefinementProperty::OnMouseEnter(QelBaseUnknown*, QelSYPEventArgs*) {
+  hovered_ = true;
+  QelSYPNotifyPropertyChange(this, "LineColor");
+  QelSYPNotifyPropertyChange(this, "BorderColor");
+}
+
+void QelRovRefinementProperty::OnMouseLeave(QelBaseUnknown*, QelSYPEventArgs*) {
+  hovered_ = false;
+  QelSYPNotifyPropertyChange(this, "LineColor");
+  QelSYPNotifyPropertyChange(this, "BorderColor");
+}
+
+void QelRovRefinementProperty::ReadEditor(QelSYPEventArgs* args, double& value) {
+  if (!args) {
+    QelAssertPointer();
+    return;
+  }
+  auto* editor = QelSysDynamicCast<QelVidCtlLineEditor>(args->GetOrigin());
+  if (!editor) {
+    QelAssertPointer();
+    return;
+  }
+  // A text that is not a number leaves the value as it was.
+  editor->GetText().ConvertToNum(&value, "%le");
+  rangeApplied_ = false;
+  QelSYPNotifyPropertyChange(this, "RangeButtonEnableFlag");
+}
+
+void QelRovRefinementProperty::LeftEditorEvent(QelBaseUnknown*, QelSYPEventArgs* args) { ReadEditor(args, leftValue_); }
+
+void QelRovRefinementProperty::RightEditorEvent(QelBaseUnknown*, QelSYPEventArgs* args) {
+  ReadEditor(args, rightValue_);
+}
+
+void QelRovRefinementProperty::LeftComboSelectedEvent(QelBaseUnknown*, QelSYPEventArgs*) {
+  if (!leftCombo_) {
+    QelAssertPointer();
+    return;
+  }
+  leftOperatorIndex_ = leftCombo_->GetSelectedIndex();
+  rangeApplied_ = false;
+  QelSYPNotifyPropertyChange(this, "RightPartEnableFlag");
+  QelSYPNotifyPropertyChange(this, "RangeButtonEnableFlag");
+}
+
+void QelRovRefinementProperty::RightComboSelectedEvent(QelBaseUnknown*, QelSYPEventArgs*) {
+  if (!rightCombo_) {
+    QelAssertPointer();
+    return;
+  }
+  rightOperatorIndex_ = rightCombo_->GetSelectedIndex();
+  rangeApplied_ = false;
+  QelSYPNotifyPropertyChange(this, "RangeButtonEnableFlag");
+}
+
+void QelRovRefinementProperty::OnRangeUpdate(QelBaseUnknown*, QelSYPEventArgs*) {
+  // An index outside the combo tables (no range was ever read) would name no operator.
+  if (leftOperatorIndex_ < 0 || leftOperatorIndex_ > 2 || rightOperatorIndex_ < 0 || rightOperatorIndex_ > 1) {
+    QelAssertBool();
+    return;
+  }
+  const QelPropertyOperator leftOp = kLeftOperators[leftOperatorIndex_];
+  const QelPropertyOperator rightOp = kRightOperators[rightOperatorIndex_];
+  const double left = leftValue_;
+  const double upper = leftOperatorIndex_ == 0 ? leftValue_ : rightValue_;
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* property = ResolveProperty(hold);
+  if (!property) return;
+  property->SetToleranceValues(leftOp, &left, rightOp, &upper);
+  rangeApplied_ = true;
+  QelSYPNotifyPropertyChange(this, "RangeButtonEnableFlag");
+}

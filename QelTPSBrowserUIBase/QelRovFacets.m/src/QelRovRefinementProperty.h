@@ -1,0 +1,102 @@
+#pragma once
+// QelRovRefinementProperty: one row of a facet section, showing one facet property as a
+// check box or radio row, a range row (operators and values of the tolerance range) or
+// an expander over its sub-properties. The widget holds its property weakly; every state
+// it shows lives in the model, so the rows rebuilt after a click show the model again.
+// It is held by its parent grid and raises SendPropEvent after every check change.
+#include "QelBaseUnknown_WR.h"
+#include "QelSYPEventArgs.h"
+#include "QelUnicodeString.h"
+#include "QelVidCtl.h"
+
+class QelRovFacetProperty;
+class QelVidCtlImageAndLabelCombo;
+class QelVidLayGrid;
+
+class QelRovRefinementProperty : public QelVidCtl {
+ public:
+  enum Kind : int { KindNone = -1, KindSingleElement = 0, KindExpander = 1, KindRange = 2 };
+
+  static const QelMetaObject& MetaObject();
+  const QelMetaObject* GetMetaObject() const override;
+
+  // For the introspection meta class: nothing set, no style.
+  QelRovRefinementProperty();
+  QelRovRefinementProperty(QelVidWidget* parent, const QelString& name, QelBaseUnknown* property, bool alternate);
+
+  // Fills the kind's parts: the sub-property rows, or the range combos and values.
+  HRESULT BuildContent();
+  // Stores a pending valid range first, asks the property to change its check, then
+  // raises SendPropEvent whatever the property answered.
+  void SetChecked(int value);
+  static QelSYPEvent* SendPropEvent();
+
+  QelString GetResourceFilename(int level) const override;
+
+  // Introspectable properties.
+  QelBaseUnknown* GetLineColor() const;  // boxed, a new reference
+  QelBaseUnknown* GetBorderColor() const;
+  int GetIconVisibility() const;
+  int GetCheckState() const { return checked_ ? 1 : 0; }
+  int GetExpandedFlag() const;
+  int GetCheckBoxVisibility() const;
+  int GetRadioVisibility() const;
+  int GetRightPartEnableFlag() const { return leftOperatorIndex_ != 0 ? 1 : 0; }
+  int GetRangeButtonEnableFlag() const;
+  QelUnicodeString GetPropertyName() const { return propertyName_; }
+  QelUnicodeString GetIcon() const;
+  QelUnicodeString GetLeftValue() const;
+  QelUnicodeString GetRightValue() const;
+
+  // Event handlers: (origin, arguments).
+  void OnClick(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void OnExpanderExpanded(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void OnExpanderCollapsed(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void OnMouseEnter(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void OnMouseLeave(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void LeftEditorEvent(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void LeftComboSelectedEvent(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void RightComboSelectedEvent(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void RightEditorEvent(QelBaseUnknown* origin, QelSYPEventArgs* args);
+  void OnRangeUpdate(QelBaseUnknown* origin, QelSYPEventArgs* args);
+
+  // State a test or a renderer may read.
+  int GetKind() const { return kind_; }
+  bool IsAlternate() const { return alternate_; }
+  bool IsHovered() const { return hovered_; }
+  bool IsRangeApplied() const { return rangeApplied_; }
+  int GetSubPropertyCount() const { return childCount_; }
+  double GetLeftNumber() const { return leftValue_; }
+  double GetRightNumber() const { return rightValue_; }
+  int GetLeftOperatorIndex() const { return leftOperatorIndex_; }
+  int GetRightOperatorIndex() const { return rightOperatorIndex_; }
+  QelVidLayGrid* GetGrid() const { return grid_; }
+
+ protected:
+  ~QelRovRefinementProperty() override;
+  void OnTemplateApplied() override;
+
+ private:
+  // The property, held for the caller; null after an assertion when it is gone
+  // ("NULL handler") or no property.
+  QelRovFacetProperty* ResolveProperty(QelBaseUnknown_var& hold) const;
+  HRESULT BuildSubPropertyWidgets(QelRovFacetProperty* property);
+  HRESULT BuildRange(QelRovFacetProperty* property);
+  void ReadEditor(QelSYPEventArgs* args, double& value);
+
+  QelBaseUnknown_WR property_;
+  int childCount_ = 0;
+  QelUnicodeString propertyName_;
+  QelVidLayGrid* grid_ = nullptr;
+  bool alternate_ = false;
+  bool hovered_ = false;
+  bool checked_ = false;
+  bool rangeApplied_ = true;
+  QelVidCtlImageAndLabelCombo* leftCombo_ = nullptr;
+  QelVidCtlImageAndLabelCombo* rightCombo_ = nullptr;
+  double leftValue_ = 0.0;
+  double rightValue_ = 0.0;
+  int rightOperatorIndex_ = -1;
+  int leftOperatorIndex_ = -1;
+  int kind_ = KindNone;
+};

@@ -1,0 +1,381 @@
+#include "QelVidStyleSheet.h"
+
+#include <fstream>
+#include <map>
+#include <optional>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+#include "QelAssert.h"
+#include "QelMsgCatalog.h"
+#include "QelSYPEventHandler.h"
+#include "QelSYPMetaClass.h"
+#include "QelVidCtl.h"
+#include "QelVidCtlButton.h"
+#include "QelVidCtlCheckButton.h"
+#include "QelVidCtlExpander.h"
+#include "QelVidCtlFrame.h"
+#include "QelVidCtlImageAndLabelCombo.h"
+#include "QelVidCtlLineEditor.h"
+#include "QelVidCtlScrollableArea.h"
+#include "QelVidLabel.h"
+#include "QelVidLayGrid.h"
+#include "QelVidSpacer.h"
+
+#ifndef QEL_RESOURCES_SOURCE_DIR
+#define QEL_RESOURCES_SOURCE_DIR ""
+#endif
+
+using nlohmann::json;
+
+// A style's template checked against one control class and kept, so that building the
+// thousandth row costs only its widgets: kinds, names, attribute values, resolved
+// properties and handlers, cells.
+struct QelVidCompiledPart {
+  std::string kind;
+  QelString name;
+  std::vector<std::pair<std::string, QelSYPValue>> attributes;
+  struct Binding {
+    std::string attribute;
+    const QelSYPMetaClass::Property* property;
+  };
+  std::vector<Binding> bindings;
+  struct Route {
+    QelSYPEvent* event;
+    std::string handler;
+  };
+  std::vector<Route> routes;
+  std::vector<QelVidCompiledPart> children;
+  std::vector<std::optional<QelVidGridConstraints>> cells;  // for a Grid's children
+  std::unique_ptr<QelVidCompiledPart> header;
+  std::unique_ptr<QelVidCompiledPart> body;
+};
+
+struct QelVidStyleSheet::Document {
+  json root;
+  // Per style and control class; only templates that passed every check are kept.
+  std::map<std::pair<std::string, const QelSYPMetaClass*>, std::shared_ptr<const QelVidCompiledPart>> compiled;
+};
+
+namespace {
+std::map<std::string, std::unique_ptr<QelVidStyleSheet>>& Cache() {
+  // Never destroyed: a module's unloader still clears it during exit.
+  static auto* cache = new std::map<std::string, std::unique_ptr<QelVidStyleSheet>>();
+  return *cache;
+}
+std::vector<std::string>& Diagnostics() {
+  static auto* diagnostics = new std::vector<std::string>();
+  return *diagnostics;
+}
+
+struct StyleError {
+  std::string place;
+  std::string what;
+};
+
+// Line and column (1-based) of a byte offset, for a parse error a person can find.
+std::string LineAndColumn(const std::string& text, size_t offset) {
+  size_t line = 1, column = 1;
+  for (size_t i = 0; i < offset && i < text.size(); ++i) {
+    if (text[i] == '\n') {
+      ++line;
+      column = 1;
+    } else {
+      ++column;
+    }
+  }
+  return "line " + std::to_string(line) + ", column " + std::to_string(column);
+}
+
+QelVar<QelVidWidget> MakePart(const std::string& kind, const QelString& name) {
+  if (kind == "Frame") return QelMakeVar<QelVidCtlFrame>(nullptr, name);
+  if (kind == "Label") return QelMakeVar<QelVidLabel>(nullptr, name);
+  if (kind == "Grid") return QelMakeVar<QelVidLayGrid>(nullptr, name);
+  if (kind == "Spacer") return QelMakeVar<QelVidSpacer>(nullptr, name);
+  if (kind == "Expander") return QelMakeVar<QelVidCtlExpander>(nullptr, name);
+  if (kind == "Button") return QelMakeVar<QelVidCtlButton>(nullptr, name);
+  if (kind == "CheckButton") return QelMakeVar<QelVidCtlCheckButton>(nullptr, name);
+  if (kind == "ScrollableArea") return QelMakeVar<QelVidCtlScrollableArea>(nullptr, name);
+  if (kind == "Combo") return QelMakeVar<QelVidCtlImageAndLabelCombo>(nullptr, name);
+  if (kind == "LineEditor") return QelMakeVar<QelVidCtlLineEditor>(nullptr, name);
+  return nullptr;
+}
+
+QelSYPValue AttributeValue(const json& value, const std::string& place) {
+  if (value.is_number_integer()) return value.get<int>();
+  if (value.is_number_float()) return value.get<double>();
+  if (value.is_boolean()) return value.get<bool>() ? 1 : 0;
+  if (value.is_string()) return QelUnicodeString(value.get<std::string>());
+  if (value.is_object()) {
+    // A text a person reads comes from a catalog: {"catalog": "...", "key": "..."}.
+    auto catalog = value.find("catalog");
+    auto key = value.find("key");
+    if (value.size() != 2 || catalog == value.end() || key == value.end() || !catalog->is_string() ||
+        !key->is_string())
+      throw StyleError{place, "a catalog text is {\"catalog\": text, \"key\": text}"};
+    return QelMsgCatalog::BuildMessage(catalog->get<std::string>().c_str(), key->get<std::string>().c_str());
+  }
+  if (value.is_array() && (value.size() == 3 || value.size() == 4)) {
+    int c[4] = {0, 0, 0, 255};
+    for (size_t i = 0; i < value.size(); ++i) {
+      if (!value[i].is_number_integer() || value[i].get<int>() < 0 || value[i].get<int>() > 255)
+        throw StyleError{place + "/" + std::to_string(i), "a colour channel must be an integer 0..255"};
+      c[i] = value[i].get<int>();
+    }
+    return QelVidColor(c[0], c[1], c[2], c[3]);
+  }
+  throw StyleError{place, "an attribute is a number, a text or a colour [r, g, b, a]"};
+}
+
+// Checks a template and compiles it; every fault throws with its place.
+class TemplateCompiler {
+ public:
+  TemplateCompiler(const std::string& className, const QelSYPMetaClass* meta) : className_(className), meta_(meta) {}
+
+  QelVidCompiledPart Compile(const json& node, const std::string& place) {
+    if (!node.is_object()) throw StyleError{place, "a part is an object"};
+    for (const auto& [key, value] : node.items()) {
+      static const char* known[] = {"kind", "name", "attributes", "bind", "on", "children", "cell", "header", "body"};
+      if (std::find(std::begin(known), std::end(known), key) == std::end(known))
+        throw StyleError{place + "/" + key, "unknown key"};
+    }
+    QelVidCompiledPart part;
+    auto kindIt = node.find("kind");
+    if (kindIt == node.end() || !kindIt->is_string()) throw StyleError{place + "/kind", "missing or not a text"};
+    part.kind = kindIt->get<std::string>();
+    std::string name;
+    if (auto it = node.find("name"); it != node.end()) {
+      if (!it->is_string()) throw StyleError{place + "/name", "not a text"};
+      name = it->get<std::string>();
+    }
+    part.name = QelString(name);
+    // A sample of the kind answers which events it raises.
+    QelVar<QelVidWidget> sample = MakePart(part.kind, part.name);
+    if (!sample) throw StyleError{place + "/kind", "unknown kind \"" + part.kind + "\""};
+    if (!name.empty()) {
+      if (std::find(names_.begin(), names_.end(), name) != names_.end())
+        throw StyleError{place + "/name", "the part name \"" + name + "\" is used twice"};
+      names_.push_back(name);
+    }
+    if (auto it = node.find("attributes"); it != node.end()) {
+      if (!it->is_object()) throw StyleError{place + "/attributes", "not an object"};
+      for (const auto& [attribute, value] : it->items())
+        part.attributes.emplace_back(attribute, AttributeValue(value, place + "/attributes/" + attribute));
+    }
+    if (auto it = node.find("bind"); it != node.end()) BindAll(*it, part, place + "/bind");
+    if (auto it = node.find("on"); it != node.end()) RouteAll(*it, sample.get(), part, place + "/on");
+    CompileChildren(node, part, place);
+    return part;
+  }
+
+ private:
+  void NeedMeta(const std::string& place) const {
+    if (!meta_) throw StyleError{place, "the class " + className_ + " has no introspection table"};
+  }
+
+  void BindAll(const json& bind, QelVidCompiledPart& part, const std::string& place) {
+    if (!bind.is_object()) throw StyleError{place, "not an object"};
+    for (const auto& [attribute, property] : bind.items()) {
+      const std::string at = place + "/" + attribute;
+      if (!property.is_string()) throw StyleError{at, "a binding names a property"};
+      NeedMeta(at);
+      const QelSYPMetaClass::Property* found = meta_->FindProperty(property.get<std::string>());
+      if (!found)
+        throw StyleError{at, "the class " + meta_->GetClassName() + " has no property \"" +
+                                 property.get<std::string>() + "\""};
+      part.bindings.push_back({attribute, found});
+    }
+  }
+
+  void RouteAll(const json& on, QelVidWidget* sample, QelVidCompiledPart& part, const std::string& place) {
+    if (!on.is_object()) throw StyleError{place, "not an object"};
+    for (const auto& [eventName, handler] : on.items()) {
+      const std::string at = place + "/" + eventName;
+      if (!handler.is_string()) throw StyleError{at, "a route names a handler"};
+      QelSYPEvent* event = sample->FindEvent(eventName);
+      if (!event)
+        throw StyleError{at, std::string("a ") + sample->GetWidgetKind() + " raises no event \"" + eventName + "\""};
+      NeedMeta(at);
+      if (!meta_->FindHandler(handler.get<std::string>()))
+        throw StyleError{at, "the class " + meta_->GetClassName() + " has no handler \"" +
+                                 handler.get<std::string>() + "\""};
+      part.routes.push_back({event, handler.get<std::string>()});
+    }
+  }
+
+  void CompileChildren(const json& node, QelVidCompiledPart& part, const std::string& place) {
+    const bool expander = part.kind == "Expander";
+    for (const char* slot : {"header", "body"}) {
+      auto it = node.find(slot);
+      if (it == node.end()) continue;
+      if (!expander) throw StyleError{place + "/" + slot, "only an Expander has a header and a body"};
+      auto child = std::make_unique<QelVidCompiledPart>(Compile(*it, place + "/" + slot));
+      (std::string(slot) == "header" ? part.header : part.body) = std::move(child);
+    }
+    auto it = node.find("children");
+    if (it == node.end()) return;
+    if (!it->is_array()) throw StyleError{place + "/children", "not a list"};
+    if (expander) throw StyleError{place + "/children", "an Expander has a header and a body, not children"};
+    const bool grid = part.kind == "Grid";
+    for (size_t i = 0; i < it->size(); ++i) {
+      const std::string at = place + "/children/" + std::to_string(i);
+      part.children.push_back(Compile((*it)[i], at));
+      auto cell = (*it)[i].find("cell");
+      if (!grid) {
+        if (cell != (*it)[i].end()) throw StyleError{at + "/cell", "only a Grid's children have a cell"};
+        part.cells.emplace_back();
+        continue;
+      }
+      QelVidGridConstraints c;
+      c.row = static_cast<int>(i);
+      if (cell != (*it)[i].end()) c = Cell(*cell, at + "/cell");
+      part.cells.emplace_back(c);
+    }
+  }
+
+  static QelVidGridConstraints Cell(const json& cell, const std::string& place) {
+    if (!cell.is_array() || (cell.size() != 2 && cell.size() != 8))
+      throw StyleError{place, "a cell is [column, row] or the eight grid constraints"};
+    int v[8] = {0, 0, 1, 1, 1, 1, 1, 0};
+    for (size_t i = 0; i < cell.size(); ++i) {
+      if (!cell[i].is_number_integer() || cell[i].get<int>() < 0)
+        throw StyleError{place + "/" + std::to_string(i), "not an integer of 0 or more"};
+      v[i] = cell[i].get<int>();
+    }
+    return {v[0], v[1], v[2], v[3], v[4], v[5], v[6], v[7]};
+  }
+
+  std::string className_;
+  const QelSYPMetaClass* meta_;
+  std::vector<std::string> names_;
+};
+
+// One handler per handler name serves every part routed to it.
+using HandlerCache = std::vector<std::pair<const std::string*, QelVar<QelSYPEventHandler>>>;
+
+// Makes the widgets of a compiled template for `control`.
+QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* control, const QelSYPMetaClass* meta,
+                                HandlerCache& handlers) {
+  QelVar<QelVidWidget> part = MakePart(compiled.kind, compiled.name);
+  if (!compiled.name.IsEmpty()) control->AddNamedPart(compiled.name.Str(), part.get());
+  for (const auto& [attribute, value] : compiled.attributes) part->SetAttribute(attribute, value);
+  for (const auto& binding : compiled.bindings) control->AddBinding(part.get(), binding.attribute, binding.property);
+  for (const auto& route : compiled.routes) {
+    auto it = std::find_if(handlers.begin(), handlers.end(), [&](const auto& h) { return *h.first == route.handler; });
+    if (it == handlers.end()) {
+      handlers.emplace_back(&route.handler,
+                            QelVar<QelSYPEventHandler>::Adopt(meta->CreateHandler(control, route.handler)));
+      it = std::prev(handlers.end());
+    }
+    if (it->second) part->AddHandler(route.event, it->second.get(), 0);
+  }
+  if (auto* expander = dynamic_cast<QelVidCtlExpander*>(part.get())) {
+    if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta, handlers).get());
+    if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta, handlers).get());
+  }
+  auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
+  for (size_t i = 0; i < compiled.children.size(); ++i) {
+    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta, handlers);
+    if (grid && compiled.cells[i]) grid->AddWidget(child.get(), *compiled.cells[i]);
+    else part->AddChild(child.get());
+  }
+  return part;
+}
+}  // namespace
+
+QelVidStyleSheet::QelVidStyleSheet(std::string path, std::unique_ptr<Document> document)
+    : path_(std::move(path)), document_(std::move(document)) {}
+QelVidStyleSheet::~QelVidStyleSheet() = default;
+
+std::string QelVidStyleSheet::StyleFolder() {
+  std::string resources = QelGetEnv("QEL_RESOURCES_DIR");
+  if (resources.empty()) resources = QEL_RESOURCES_SOURCE_DIR;
+  return resources + "/styles";
+}
+
+const QelVidStyleSheet* QelVidStyleSheet::Load(const std::string& fileName, const std::string& forStyle) {
+  const std::string path = StyleFolder() + "/" + fileName;
+  const std::string asked = forStyle.empty() ? "" : " (style \"" + forStyle + "\" asked for)";
+  if (auto it = Cache().find(path); it != Cache().end()) return it->second.get();
+  if (fileName.empty() || fileName.find('/') != std::string::npos) {
+    Report("style sheet \"" + fileName + "\": not a file name of the style folder" + asked);
+    return nullptr;
+  }
+  std::ifstream in(path, std::ios::binary);
+  if (!in) {
+    Report("style sheet " + path + ": cannot be read" + asked);
+    return nullptr;
+  }
+  std::stringstream buffer;
+  buffer << in.rdbuf();
+  const std::string text = buffer.str();
+  auto document = std::make_unique<Document>();
+  try {
+    document->root = json::parse(text, nullptr, true, true);
+  } catch (const json::parse_error& e) {
+    Report("style sheet " + path + ": malformed at " + LineAndColumn(text, e.byte > 0 ? e.byte - 1 : 0) + asked +
+           ": " + e.what());
+    return nullptr;
+  }
+  const json& root = document->root;
+  if (!root.is_object() || !root.contains("styles") || !root["styles"].is_object()) {
+    Report("style sheet " + path + ": at /styles: the sheet must be an object with an object \"styles\"" + asked);
+    return nullptr;
+  }
+  auto* sheet = new QelVidStyleSheet(path, std::move(document));
+  Cache()[path].reset(sheet);
+  return sheet;
+}
+
+void QelVidStyleSheet::ClearCache() { Cache().clear(); }
+
+bool QelVidStyleSheet::HasStyle(const std::string& style) const { return document_->root["styles"].contains(style); }
+
+std::vector<std::string> QelVidStyleSheet::StyleNames() const {
+  std::vector<std::string> names;
+  for (const auto& [name, _] : document_->root["styles"].items()) names.push_back(name);
+  return names;
+}
+
+HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& style) const {
+  if (!control) return E_FAIL;
+  const QelSYPMetaClass* meta = control->GetSYPMetaClass();
+  auto& compiled = document_->compiled[{style, meta}];
+  if (!compiled) {
+    const json& styles = document_->root["styles"];
+    auto it = styles.find(style);
+    if (it == styles.end()) {
+      document_->compiled.erase({style, meta});
+      Report("style sheet " + path_ + ": style \"" + style + "\": no such style");
+      return E_FAIL;
+    }
+    try {
+      if (!it->is_object() || !it->contains("template"))
+        throw StyleError{"/styles/" + style, "a style is an object with a \"template\""};
+      TemplateCompiler compiler(control->IsA(), meta);
+      compiled = std::make_shared<QelVidCompiledPart>(compiler.Compile((*it)["template"], "/styles/" + style + "/template"));
+    } catch (const StyleError& e) {
+      document_->compiled.erase({style, meta});
+      Report("style sheet " + path_ + ": style \"" + style + "\": at " + e.place + ": " + e.what);
+      return E_FAIL;
+    } catch (const json::exception& e) {
+      document_->compiled.erase({style, meta});
+      Report("style sheet " + path_ + ": style \"" + style + "\": " + e.what());
+      return E_FAIL;
+    }
+  }
+  std::shared_ptr<const QelVidCompiledPart> held = compiled;  // the map may change below
+  HandlerCache handlers;
+  QelVar<QelVidWidget> root = BuildParts(*held, control, meta, handlers);
+  control->SetTemplateRoot(root.get());
+  return S_OK;
+}
+
+std::vector<std::string> QelVidStyleSheet::TakeDiagnostics() { return std::exchange(Diagnostics(), {}); }
+
+void QelVidStyleSheet::Report(const std::string& text) {
+  // Kept for whoever asks next; a process that never asks keeps only the latest ones.
+  if (Diagnostics().size() >= 64) Diagnostics().erase(Diagnostics().begin());
+  Diagnostics().push_back(text);
+  QelSysLogError(("qel: " + text + "\n").c_str());
+}
