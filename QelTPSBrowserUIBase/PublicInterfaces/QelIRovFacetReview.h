@@ -31,6 +31,9 @@ class QelIRovFacetReview : public virtual QelBaseUnknown {
   // The user's click on a row: S_OK when the state changed, S_FALSE when it already was
   // so, E_FAIL when refused (a refused confirmation).
   virtual HRESULT Click(QelBaseUnknown* property, bool checked) = 0;
+  // The panel's facet widgets, built over the facets as they are now and printed as a
+  // person sees them (text) or as JSON.
+  virtual HRESULT PrintWidgets(std::string& text, bool json) = 0;
 
  protected:
   ~QelIRovFacetReview() override = default;

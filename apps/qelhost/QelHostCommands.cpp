@@ -197,6 +197,18 @@ bool Picture(QelHostSession& session, const std::vector<std::string>& args, std:
   return true;
 }
 
+bool Widgets(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
+  const bool json = args.size() == 1 && args[0] == "json";
+  if (!json && !NeedArguments(args, 0, "no argument, or json", error)) return false;
+  std::string text;
+  if (!session.Review() || session.Review()->PrintWidgets(text, json) != S_OK) {
+    error = "the panel's widgets could not be built";
+    return false;
+  }
+  session.Out() << text;
+  return true;
+}
+
 bool Help(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
   if (!NeedArguments(args, 0, "no argument", error)) return false;
   for (const QelHostCommand& command : QelHostCommandTable()) {
@@ -222,6 +234,7 @@ std::vector<QelHostCommand>& QelHostCommandTable() {
       {"untick", "PATH", "untick a property by its label path", &Untick},
       {"answer", "yes|no", "answer the next confirmation question ahead", &Answer},
       {"display", "", "print the model with what is shown and hidden", &Display},
+      {"widgets", "[json]", "print the panel's facet widgets as a person sees them (or as JSON)", &Widgets},
       {"thumbnail", "NAME FILE", "write the thumbnail of a view or capture as PNG (NAME \"*\": all, into a folder)", &Thumbnail},
       {"picture", "FILE", "write a picture of the whole model, as shown, as PNG", &Picture},
       {"help", "", "list the commands", &Help},

@@ -6,6 +6,9 @@
 #include "QelRovFacetGroup.h"
 #include "QelRovFacetProperty.h"
 #include "QelRovFacetPropertyGroup.h"
+#include "QelRovRefinementFacet.h"
+#include "QelVidLayGrid.h"
+#include "QelVidWidgetPrinter.h"
 
 namespace {
 // The facet group with a public way in; the group itself keeps its destructor protected.
@@ -15,6 +18,15 @@ class ReviewFacetGroup final : public QelRovFacetGroup {
 
  private:
   ~ReviewFacetGroup() override = default;
+};
+
+// The root the facet widgets are printed from, as the panel's dialog holds them.
+class ReviewPanel final : public QelVidWidget {
+ public:
+  ReviewPanel() : QelVidWidget(nullptr, QelString("Panel")) {}
+
+ private:
+  ~ReviewPanel() override = default;
 };
 
 QelIRovFacetReview::Kind KindOf(QelRovFacetProperty* property) {
@@ -100,4 +112,22 @@ HRESULT QelRovFacetReview::Click(QelBaseUnknown* property, bool checked) {
   // A click may rebuild the row's own group away; keep it until the click is done.
   QelBaseUnknown_var hold(property);
   return clicked->SetCheck(checked);
+}
+
+HRESULT QelRovFacetReview::PrintWidgets(std::string& text, bool json) {
+  text.clear();
+  if (!group_) return E_FAIL;
+  QelListValQelBaseUnknown_var facets;
+  if (group_->ListFacets(facets) != S_OK) return E_UNEXPECTED;
+  auto panel = QelMakeVar<ReviewPanel>();
+  auto grid = QelMakeVar<QelVidLayGrid>(panel.get(), QelString("DialogGrid"));
+  panel->AddChild(grid.get());
+  int row = 0;
+  for (const auto& facet : facets) {
+    auto widget = QelMakeVar<QelRovRefinementFacet>(panel.get(), QelString("Facet" + std::to_string(row)), facet.get());
+    if (QelFailed(widget->BuildPropertyWidgets())) continue;
+    grid->AddWidget(widget.get(), {0, row++, 1, 1, 1, 1, 1, 0});
+  }
+  text = json ? QelVidPrintJson(panel.get()) + "\n" : QelVidPrintText(panel.get());
+  return S_OK;
 }

@@ -19,6 +19,7 @@ class QelRovFacetReview : public QelIRovFacetReview {
   HRESULT Open(QelBaseUnknown* editor) override;
   HRESULT ListRows(std::vector<Row>& facets) override;
   HRESULT Click(QelBaseUnknown* property, bool checked) override;
+  HRESULT PrintWidgets(std::string& text, bool json) override;
 
  protected:
   QelRovFacetReview() = default;

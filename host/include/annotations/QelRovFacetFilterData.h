@@ -31,7 +31,9 @@ class QelRovFacetFilterData : public QelBaseUnknown {
   ~QelRovFacetFilterData() override;
 
  private:
-  QelPropertyOperator leftOp_ = QelPropertyOperatorLessOrEqual;
+  // An open range "lower <= value <= upper" with neither bound set: operators the panel's
+  // range row can show from the start (its left combo has no "value <= lower").
+  QelPropertyOperator leftOp_ = QelPropertyOperatorGreaterOrEqual;
   QelPropertyOperator rightOp_ = QelPropertyOperatorLessOrEqual;
   double left_ = 0.0;
   double right_ = 0.0;
