@@ -260,17 +260,20 @@ TEST_F(SettingRepositoryTest, ProcessKilledAtRandomMomentsOfSavesAlwaysLeavesAWh
   std::mt19937 random(20261206);
   int lastSeen = 0;
   size_t mostTemporaries = 0;
-  for (int round = 0; round < 50; ++round) {
+  // At least 50 rounds, and more (up to 300) until a kill has landed inside a save: how
+  // long a save takes varies with the build and the machine's load.
+  for (int round = 0; round < 300 && (round < 50 || mostTemporaries == 0); ++round) {
     int ready[2];
     ASSERT_EQ(::pipe(ready), 0);
     pid_t child = ::fork();
     ASSERT_GE(child, 0);
     if (child == 0) {
       ::close(ready[0]);
-      ::write(ready[1], "r", 1);
       for (int n = lastSeen + 1;; ++n) {
         repo->WriteSetting("n", n, 1);
         repo->SaveRepository();
+        // Ready once one save is whole, so every kill falls among the saves that follow.
+        if (n == lastSeen + 1) ::write(ready[1], "r", 1);
       }
     }
     ::close(ready[1]);
