@@ -4,6 +4,7 @@
 #include "QelIRovFacetPropertyObserver.h"
 #include "QelRovFacetGroup.h"
 #include "QelRovFacetProperty.h"
+#include "QelRovFacetPropertyGroup.h"
 
 const QelMetaObject& QelRovFacet::MetaObject() {
   static const QelMetaObject& meta = QelMetaObject::Declare("QelRovFacet", QelMetaKind::Implementation,
@@ -39,6 +40,12 @@ QelRovFacetProperty* QelRovFacet::PropertyAt(int position) const {
   QelRovFacetProperty* property = QelSysDynamicCast<QelRovFacetProperty>(properties_[position].get());
   if (!property) QelAssertPointer("QelRovFacetProperty");
   return property;
+}
+
+QelRovFacetPropertyGroup* QelRovFacet::PropertyGroupAt(int position) const {
+  auto* group = QelSysDynamicCast<QelRovFacetPropertyGroup>(properties_[position].get());
+  if (!group) QelAssertPointer("QelRovFacetPropertyGroup");
+  return group;
 }
 
 HRESULT QelRovFacet::GetFacetName(QelUnicodeString& name) const {

@@ -9,6 +9,7 @@
 #include "QelUnicodeString.h"
 
 class QelRovFacetGroup;
+class QelRovFacetPropertyGroup;
 class QelRovFacetProperty;
 
 class QelRovFacet : public virtual QelBaseUnknown {
@@ -51,6 +52,9 @@ class QelRovFacet : public virtual QelBaseUnknown {
   // The top-level property at `position` (1-based); null, after a report, when the entry
   // is not a property.
   QelRovFacetProperty* PropertyAt(int position) const;
+  // The property group at `position` (1-based), or null after a pointer assertion naming
+  // "QelRovFacetPropertyGroup".
+  QelRovFacetPropertyGroup* PropertyGroupAt(int position) const;
   void SetFacetName(const QelUnicodeString& name) { name_ = name; }
 
  private:

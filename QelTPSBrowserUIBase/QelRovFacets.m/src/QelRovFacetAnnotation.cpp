@@ -123,13 +123,6 @@ QelRovFacetAnnotation::QelRovFacetAnnotation(QelBaseUnknown* group) : QelRovFace
 
 QelRovFacetAnnotation::~QelRovFacetAnnotation() = default;
 
-QelRovFacetPropertyGroup* QelRovFacetAnnotation::GroupAt(int position) const {
-  auto* group = QelSysDynamicCast<QelRovFacetPropertyGroup>(
-      const_cast<QelRovFacetAnnotation*>(this)->PropertyList()[position].get());
-  if (!group) QelAssertPointer("QelRovFacetPropertyGroup");
-  return group;
-}
-
 bool QelRovFacetAnnotation::IsProperty(int position, QelBaseUnknown* property) const {
   QelBaseUnknown* entry = const_cast<QelRovFacetAnnotation*>(this)->PropertyList()[position].get();
   return entry && property && entry->IsEqual(property);
@@ -189,10 +182,10 @@ HRESULT QelRovFacetAnnotation::BuildKindProperties(QelBaseUnknown* root, QelRovF
 }
 
 void QelRovFacetAnnotation::ClearDynamicProperties() {
-  QelRovFacetPropertyGroup* type = GroupAt(kType);
+  QelRovFacetPropertyGroup* type = PropertyGroupAt(kType);
   if (!type) return;
   type->RemoveAllProperties();
-  QelRovFacetPropertyGroup* custom = GroupAt(kCustom);
+  QelRovFacetPropertyGroup* custom = PropertyGroupAt(kCustom);
   if (!custom) return;
   const QelListValQelBaseUnknown_var& kinds = custom->GetPropertyList();
   if (kinds.Size() != KindCount) {
@@ -216,7 +209,7 @@ HRESULT QelRovFacetAnnotation::BuildTypeRows(QelBaseUnknown* root, QelRovFacetFi
     QelAssertBool("root, filter data and 5 properties");
     return E_UNEXPECTED;
   }
-  QelRovFacetPropertyGroup* type = GroupAt(kType);
+  QelRovFacetPropertyGroup* type = PropertyGroupAt(kType);
   if (!type) return E_UNEXPECTED;
 
   // Rows left from an earlier pass are emptied and indexed, so that this pass finds them.
@@ -292,7 +285,7 @@ HRESULT QelRovFacetAnnotation::BuildKindRows(QelBaseUnknown* root, QelRovFacetFi
     QelAssertBool("root, filter data and 5 properties");
     return E_UNEXPECTED;
   }
-  QelRovFacetPropertyGroup* custom = GroupAt(kCustom);
+  QelRovFacetPropertyGroup* custom = PropertyGroupAt(kCustom);
   if (!custom) return E_UNEXPECTED;
   const QelListValQelBaseUnknown_var& kinds = custom->GetPropertyList();
   if (kinds.Size() != KindCount) {

@@ -48,6 +48,6 @@ class QelRovFacetAnnotation : public QelRovFacet {
                         const QelListValQelBaseUnknown_var* annotations, std::vector<signed char>* visu);
   HRESULT BuildKindRows(QelBaseUnknown* root, QelRovFacetFilterData* filterData,
                         const QelListValQelBaseUnknown_var* annotations, const std::vector<signed char>* visu);
-  QelRovFacetPropertyGroup* GroupAt(int position) const;
+
   bool IsProperty(int position, QelBaseUnknown* property) const;
 };

@@ -102,11 +102,8 @@ void QelRovFacetAnnotationSet::UpdateRootVisibility(QelRovFacetProperty* rootCho
 }
 
 void QelRovFacetAnnotationSet::Rebuild() {
-  QelRovFacetPropertyGroup* custom = QelSysDynamicCast<QelRovFacetPropertyGroup>(PropertyList()[kCustom].get());
-  if (!custom) {
-    QelAssertPointer("QelRovFacetPropertyGroup");
-    return;
-  }
+  QelRovFacetPropertyGroup* custom = PropertyGroupAt(kCustom);
+  if (!custom) return;
   custom->RemoveAllProperties();
   QelBaseUnknown_var root;
   QelRovFacetFilterData* filterData = nullptr;
@@ -192,11 +189,12 @@ HRESULT QelRovFacetAnnotationSet::ApplyPropertyChange(QelBaseUnknown* property) 
   if (IsProperty(kAll, property)) {
     QelRovFacetServices::ListAllSets(root.get(), sets, true);
     QelRovFacetServices::EnableDisableDisplay(sets, 1, nullptr);
-    auto* custom = QelSysDynamicCast<QelRovFacetPropertyGroup>(PropertyList()[kCustom].get());
+    QelRovFacetPropertyGroup* custom = PropertyGroupAt(kCustom);
+    if (!custom) return E_UNEXPECTED;
     QelBaseUnknown_var groupObject = FacetGroupRef().Get();
     auto* group = QelSysDynamicCast<QelRovFacetGroup>(groupObject.get());
-    if (!custom || !group) {
-      QelAssertPointer(custom ? "QelRovFacetGroup" : "QelRovFacetPropertyGroup");
+    if (!group) {
+      QelAssertPointer("QelRovFacetGroup");
       return E_UNEXPECTED;
     }
     BuildSetItems(sets, custom);

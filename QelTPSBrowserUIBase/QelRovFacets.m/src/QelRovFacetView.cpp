@@ -72,11 +72,8 @@ void QelRovFacetView::Refresh() {
 }
 
 void QelRovFacetView::Rebuild() {
-  auto* custom = QelSysDynamicCast<QelRovFacetPropertyGroup>(PropertyList()[kCustom].get());
-  if (!custom) {
-    QelAssertPointer("QelRovFacetPropertyGroup");
-    return;
-  }
+  auto* custom = PropertyGroupAt(kCustom);
+  if (!custom) return;
   custom->RemoveAllProperties();
   QelBaseUnknown_var root;
   QelRovFacetFilterData* filterData = nullptr;
@@ -93,11 +90,8 @@ HRESULT QelRovFacetView::BuildViewCaptureItems(QelBaseUnknown* root) {
     QelAssertBool("2 properties");
     return E_UNEXPECTED;
   }
-  auto* custom = QelSysDynamicCast<QelRovFacetPropertyGroup>(PropertyList()[kCustom].get());
-  if (!custom) {
-    QelAssertPointer("QelRovFacetPropertyGroup");
-    return E_UNEXPECTED;
-  }
+  auto* custom = PropertyGroupAt(kCustom);
+  if (!custom) return E_UNEXPECTED;
   custom->RemoveAllProperties();
   QelBaseUnknown_var made;
   QelLumInstantiateComponentBase(kSetComponent, made);
