@@ -1,6 +1,8 @@
 // Counting, handles, weak references, ties, extensions and meta classes working together.
 #include <gtest/gtest.h>
 
+#include <thread>
+
 #include "QelAssert.h"
 #include "QelBaseUnknown_WR.h"
 #include "TestObjects.h"
@@ -173,6 +175,19 @@ TEST_F(ComponentModelTest, FirstReferenceIsAdoptedNeverRetained) {
   }
   orphan->Release();
 }
+
+#ifndef NDEBUG
+TEST_F(ComponentModelTest, CountingOffTheOwningThreadIsReported) {
+  auto made = QelMakeVar<FrameLikeObject>();
+  QelAssertionCapture capture;
+  std::thread([&] {
+    QelBaseUnknown_var copy = made;  // a retain and a release on a worker thread
+  }).join();
+  EXPECT_EQ(capture.Count(kQelAssertKindBool, "counted object used off its owning thread"), 2);
+  { QelBaseUnknown_var copy = made; }
+  EXPECT_EQ(capture.Count(), 2) << "the owning thread itself is never reported";
+}
+#endif
 
 // `cur = cur->next` must read the next node before the old one (which owns it) goes.
 TEST_F(ComponentModelTest, AssigningAHandleFromWhatItHoldsKeepsTheSourceAlive) {

@@ -6,7 +6,9 @@
 // They are destroyed by the Release that drops the count to zero, never by `delete`
 // (destructors are non-public; QelVar refuses a counted type whose destructor is public).
 // Debug builds report a reference added to an object whose first reference has no owner
-// yet (`QelVar<T> v(new T)` leaks), and a count left unbalanced by a destructor. Interfaces derive *virtually* from QelBaseUnknown, so an
+// yet (`QelVar<T> v(new T)` leaks), a count left unbalanced by a destructor, and an
+// object made, retained or released off the thread that made the first object (counts
+// are not atomic). Interfaces derive *virtually* from QelBaseUnknown, so an
 // object that implements several interfaces directly still has one count. An interface
 // may also be provided by a tie (a small counted object forwarding to the
 // implementation) or by a data extension; both are found through QelDictionary.

@@ -1,6 +1,7 @@
 #include "QelBaseUnknown.h"
 
 #include <cstdio>
+#include <thread>
 #include <utility>
 #include <vector>
 
@@ -14,13 +15,31 @@ int64_t g_liveObjects = 0;
 // A count this high marks an object in destruction: a balanced AddRef/Release made by
 // code the destructor calls cannot reach zero again and delete twice.
 constexpr uint32_t kDestroying = 1u << 30;
+
+// Counts, weak flags and observer lists assume one thread: the one that made the first
+// counted object. Debug builds turn that assumption into a check, so work handed to
+// another thread (a renderer, a server) that touches a counted object is reported
+// instead of racing on its count.
+#ifndef NDEBUG
+std::thread::id g_owningThread;
+void CheckOwningThread() {
+  const std::thread::id here = std::this_thread::get_id();
+  if (g_owningThread == std::thread::id()) g_owningThread = here;
+  else if (here != g_owningThread) QelAssertBool("counted object used off its owning thread");
+}
+#else
+void CheckOwningThread() {}
+#endif
 }  // namespace
 
 struct QelBaseUnknown::Extensions {
   std::vector<std::pair<const QelMetaObject*, QelBaseUnknown*>> items;
 };
 
-QelBaseUnknown::QelBaseUnknown() { ++g_liveObjects; }
+QelBaseUnknown::QelBaseUnknown() {
+  CheckOwningThread();
+  ++g_liveObjects;
+}
 
 QelBaseUnknown::~QelBaseUnknown() {
   if (extensions_) {
@@ -44,6 +63,7 @@ QelBaseUnknown::~QelBaseUnknown() {
 int64_t QelBaseUnknown::LiveObjectCount() { return g_liveObjects; }
 
 uint32_t QelBaseUnknown::AddRef() {
+  CheckOwningThread();
   // A second reference while the first has no owner: `QelVar<T> v(new T)` and the like,
   // whose creation reference is never released.
   if (refs_ == 1 && !firstReferenceOwned_) {
@@ -54,6 +74,7 @@ uint32_t QelBaseUnknown::AddRef() {
 }
 
 uint32_t QelBaseUnknown::Release() {
+  CheckOwningThread();
   firstReferenceOwned_ = true;  // the creator gave its reference back
   if (--refs_ != 0) return refs_;
   refs_ = kDestroying;
