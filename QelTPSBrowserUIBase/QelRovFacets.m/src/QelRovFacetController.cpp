@@ -37,7 +37,8 @@ void* QelRovFacetController::QueryDirect(const QelIID& iid) {
 QelBaseUnknown* QelRovFacetController::Create() {
   if (!QelRovFacetServices::IsRefinementDevActive()) return nullptr;
   QelRovFacetController*& instance = Instance();
-  if (!instance) instance = new QelRovFacetController();  // the process-wide reference
+  // The process-wide pointer owns the creation reference.
+  if (!instance) instance = QelMakeVar<QelRovFacetController>().Detach();
   instance->AddRef();
   return instance;
 }

@@ -54,8 +54,10 @@ class QelRovFacetController : public QelIHyxFacetCtrl {
   void OnWindowActivated();
   void OnWorkbenchChanged();
 
- protected:
+  // Hosts obtain the controller through Create; one made here is not the process-wide one.
   QelRovFacetController();
+
+ protected:
   ~QelRovFacetController() override;
   void* QueryDirect(const QelIID& iid) override;
 
