@@ -210,12 +210,15 @@ bool Range(QelHostSession& session, const Args& args, std::string& error) {
     rightCombo->Select(right);
     rightEditor->Enter(QelUnicodeString(args[4].c_str()));
   }
-  if (!apply->IsEnabled()) {
+  // An unticked range row takes its range with the tick; a ticked one with its button.
+  auto* check = dynamic_cast<QelVidCtlCheckButton*>(row->check.get());
+  const bool ticking = check && row->state != 1;
+  if (!ticking && !apply->IsEnabled()) {
     error = "the range is not valid (the apply button stays disabled)";
     return false;
   }
   session.BeginChanges();
-  apply->Click();
+  ticking ? check->Click() : apply->Click();
   session.Out() << "range " << args[0] << " applied\n";
   session.EndChanges();
   return true;

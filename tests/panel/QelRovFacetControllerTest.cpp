@@ -37,11 +37,15 @@ TEST_F(ControllerTest, SettingValuesAndWorkbenchesDecideThePanel) {
   QelFrmContext::GetContext()->SwitchWorkbench(QelString("Sketcher"));
   EXPECT_FALSE(ctrl->IsDataFilteringPanelInitialized(editor.get()));
   EXPECT_EQ(ctrl->GetGroupCount(), 1);
+  // Coming back to a workbench that has the panel switched on brings it back.
+  WriteSetting("TPSCfg", 1, true);
+  QelFrmContext::GetContext()->SwitchWorkbench(QelString("TPSCfg"));
+  EXPECT_TRUE(ctrl->IsDataFilteringPanelInitialized(editor.get()));
+  QelFrmContext::GetContext()->SwitchWorkbench(QelString("Sketcher"));
   ctrl->CreateDataFilteringPanelIfNecessary();
   EXPECT_EQ(ctrl->GetGroupCount(), 0);
 
-  // Back in a panel workbench whose key holds 1, the switch itself builds the panel.
-  WriteSetting("TPSCfg", 1, true);
+  // Without a group, entering a panel workbench whose key holds 1 builds group and panel.
   QelFrmContext::GetContext()->SwitchWorkbench(QelString("TPSCfg"));
   EXPECT_TRUE(ctrl->IsDataFilteringPanelInitialized(editor.get()));
 }

@@ -246,10 +246,14 @@ void QelRovFacetController::OnWorkbenchChanged() {
   if (!editor) return;
   const int setting = ReadDataFilteringPanelSetting(context->GetNextWorkbenchName());
   if (QelRovFacetGroup* group = GiveExistingFacetGroupOfEditor(editor)) {
-    if (setting == 1)
+    if (setting != 1)
+      group->ClosePanel();
+    else if (group->IsPanelInitialized())
       group->RefreshPanel();
     else
-      group->ClosePanel();
+      // Closed when a workbench without the panel was entered: a refresh alone would
+      // leave the panel away for good.
+      group->CreatePanel();
     return;
   }
   if (setting != 1) return;
