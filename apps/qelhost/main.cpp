@@ -141,7 +141,12 @@ int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
   }
   // A terminal on both sides is a person; a terminal that nobody reads the answers of
   // (output captured by a test runner or a file) gets no session rather than a wait.
-  if (isatty(STDIN_FILENO)) return isatty(STDOUT_FILENO) ? session.RunInteractive() : 0;
+  if (isatty(STDIN_FILENO)) {
+    if (!isatty(STDOUT_FILENO)) return 0;
+    // A person starts with the panel in view.
+    session.Execute("panel", error);
+    return session.RunInteractive();
+  }
   return session.RunScript(std::cin, "stdin");
 }
 }  // namespace
