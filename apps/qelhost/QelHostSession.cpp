@@ -71,10 +71,6 @@ bool QelHostSession::Attach(const QelBaseUnknown_var& root, const std::string& n
     return false;
   }
   auto editor = QelMakeVar<QelFrmEditor>(root.get());
-  // The root is the UI-active object, as when a product is opened.
-  auto active = QelMakeVar<QelPathElement>();
-  active->AddChildElement(root.get());
-  editor->SetUIActivePath(active.get());
   if (displayCallback_) QelCallbackManager::Get().RemoveCallback(displayCallback_);
   displayCallback_ = QelRovFacetServices::AddDisplayChangeCallback(
       root.get(), editor.get(), [this](QelBaseUnknown*, QelBaseUnknown* object) {
@@ -94,6 +90,11 @@ bool QelHostSession::Attach(const QelBaseUnknown_var& root, const std::string& n
   window->SetViewer(viewer.get());
   layout->AddWindow(window.get());
   layout->SetCurrentWindow(window.get());
+  // The root is the UI-active object, as when a product is opened; its editor is the
+  // current one by now, as listeners of the change expect.
+  auto active = QelMakeVar<QelPathElement>();
+  active->AddChildElement(root.get());
+  editor->SetUIActivePath(active.get());
   window_ = window;
   viewer_ = viewer;
   root_ = root;
