@@ -1,147 +1,26 @@
 #include "QelHostCommands.h"
 
-#include <algorithm>
-#include <functional>
 #include <ostream>
 
 #include <dlfcn.h>
 
 #include "QelDlgNotify.h"
+#include "QelHostPanelCommands.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
 #include "QelModelPrinter.h"
 #include "QelReviewFramework.h"
 
 namespace {
-using Row = QelIRovFacetReview::Row;
-using Kind = QelIRovFacetReview::Kind;
-
-const char* KindName(Kind kind) {
-  switch (kind) {
-    case Kind::Facet: return "facet";
-    case Kind::Radio: return "radio";
-    case Kind::CheckBox: return "check box";
-    case Kind::Group: return "group";
-    case Kind::Range: return "range";
-  }
-  return "?";
-}
-
-const char* StateName(QelCheckState state) {
-  if (state == Checked) return "checked";
-  if (state == Unchecked) return "unchecked";
-  if (state == PartiallyChecked) return "partially checked";
-  return "unknown";
-}
-
-bool ListRows(QelHostSession& session, std::vector<Row>& facets, std::string& error) {
-  if (!session.Review() || session.Review()->ListRows(facets) != S_OK) {
-    error = "no facets: no model is open";
-    return false;
-  }
-  return true;
-}
-
-void PrintRows(std::ostream& out, const std::vector<Row>& rows, const std::string& parent, int depth) {
-  for (const Row& row : rows) {
-    const std::string path = parent.empty() ? row.label : parent + "/" + row.label;
-    out << std::string(2 * depth, ' ') << path;
-    if (row.kind != Kind::Facet) out << "  [" << KindName(row.kind) << ", " << StateName(row.state) << "]";
-    out << '\n';
-    PrintRows(out, row.children, path, depth + 1);
-  }
-}
-
-void CollectPaths(const std::vector<Row>& rows, const std::string& parent, std::vector<std::string>& paths) {
-  for (const Row& row : rows) {
-    const std::string path = parent.empty() ? row.label : parent + "/" + row.label;
-    paths.push_back(path);
-    CollectPaths(row.children, path, paths);
-  }
-}
-
-// Labels may hold slashes themselves ("Part1/Set.1"), so each level tries every label
-// that starts the rest of the path.
-const Row* Resolve(const std::vector<Row>& rows, const std::string& path) {
-  for (const Row& row : rows) {
-    if (path == row.label) return &row;
-    if (path.size() > row.label.size() && path.compare(0, row.label.size(), row.label) == 0 &&
-        path[row.label.size()] == '/')
-      if (const Row* found = Resolve(row.children, path.substr(row.label.size() + 1))) return found;
-  }
-  return nullptr;
-}
-
-size_t Distance(const std::string& a, const std::string& b) {
-  std::vector<size_t> previous(b.size() + 1), current(b.size() + 1);
-  for (size_t j = 0; j <= b.size(); ++j) previous[j] = j;
-  for (size_t i = 1; i <= a.size(); ++i) {
-    current[0] = i;
-    for (size_t j = 1; j <= b.size(); ++j)
-      current[j] = std::min({previous[j] + 1, current[j - 1] + 1, previous[j - 1] + (a[i - 1] != b[j - 1] ? 1 : 0)});
-    std::swap(previous, current);
-  }
-  return previous[b.size()];
-}
-
 bool NeedArguments(const std::vector<std::string>& args, size_t count, const char* usage, std::string& error) {
   if (args.size() == count) return true;
   error = std::string("expects ") + usage;
   return false;
 }
 
-bool Click(QelHostSession& session, const std::vector<std::string>& args, bool checked, std::string& error) {
-  if (!NeedArguments(args, 1, "one label path, for example \"Annotation Sets/All sets\"", error)) return false;
-  std::vector<Row> facets;
-  if (!ListRows(session, facets, error)) return false;
-  const Row* row = Resolve(facets, args[0]);
-  if (!row) {
-    std::vector<std::string> paths;
-    CollectPaths(facets, "", paths);
-    std::string closest;
-    size_t best = SIZE_MAX;
-    for (const auto& path : paths)
-      if (size_t d = Distance(args[0], path); d < best) best = d, closest = path;
-    error = "no property \"" + args[0] + "\"" + (closest.empty() ? "" : "; closest: \"" + closest + "\"");
-    return false;
-  }
-  if (!row->property) {
-    error = "\"" + args[0] + "\" is a facet; tick one of its properties";
-    return false;
-  }
-  session.BeginChanges();
-  const HRESULT clicked = session.Review()->Click(row->property.get(), checked);
-  std::ostream& out = session.Out();
-  out << (checked ? "tick " : "untick ") << args[0] << ": ";
-  if (clicked == S_OK)
-    out << "done\n";
-  else if (clicked == S_FALSE)
-    out << (checked ? "already ticked\n" : "not changed (a radio choice is left by choosing another)\n");
-  else
-    out << "refused\n";
-  session.EndChanges();
-  return true;
-}
-
 bool Open(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
   if (!NeedArguments(args, 1, "one model file", error)) return false;
   return session.Open(args[0], error);
-}
-
-bool Facets(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
-  if (!NeedArguments(args, 0, "no argument", error)) return false;
-  std::vector<Row> facets;
-  if (!ListRows(session, facets, error)) return false;
-  PrintRows(session.Out(), facets, "", 0);
-  return true;
-}
-
-bool Tick(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
-  return Click(session, args, true, error);
-}
-
-bool Untick(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
-  return Click(session, args, false, error);
 }
 
 bool Answer(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
@@ -197,18 +76,6 @@ bool Picture(QelHostSession& session, const std::vector<std::string>& args, std:
   return true;
 }
 
-bool Widgets(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
-  const bool json = args.size() == 1 && args[0] == "json";
-  if (!json && !NeedArguments(args, 0, "no argument, or json", error)) return false;
-  std::string text;
-  if (!session.Review() || session.Review()->PrintWidgets(text, json) != S_OK) {
-    error = "the panel's widgets could not be built";
-    return false;
-  }
-  session.Out() << text;
-  return true;
-}
-
 bool Help(QelHostSession& session, const std::vector<std::string>& args, std::string& error) {
   if (!NeedArguments(args, 0, "no argument", error)) return false;
   for (const QelHostCommand& command : QelHostCommandTable()) {
@@ -229,12 +96,27 @@ bool Quit(QelHostSession& session, const std::vector<std::string>& args, std::st
 std::vector<QelHostCommand>& QelHostCommandTable() {
   static std::vector<QelHostCommand> table = {
       {"open", "FILE", "open a product model (the sample is open at start)", &Open},
-      {"facets", "", "print the facets as trees: label path, kind, check state", &Facets},
-      {"tick", "PATH", "tick a property by its label path and print what the display changed", &Tick},
-      {"untick", "PATH", "untick a property by its label path", &Untick},
+      {"facets", "", "print the panel's rows as trees: label path, kind, check state", &QelHostPanelCommands::Facets},
+      {"tick", "PATH", "click a row's box by its label path and print what the display changed", &QelHostPanelCommands::Tick},
+      {"untick", "PATH", "click a ticked row's box by its label path", &QelHostPanelCommands::Untick},
       {"answer", "yes|no", "answer the next confirmation question ahead", &Answer},
+      {"range", "PATH OP V [OP V]", "enter a tolerance range in a range row and apply it", &QelHostPanelCommands::Range},
+      {"expand", "PATH", "unfold a section or a row with sub-rows", &QelHostPanelCommands::Expand},
+      {"collapse", "PATH", "fold a section or a row with sub-rows", &QelHostPanelCommands::Collapse},
+      {"scroll", "H V", "scroll the panel to the offsets", &QelHostPanelCommands::Scroll},
+      {"refresh", "", "press the panel's refresh button", &QelHostPanelCommands::Refresh},
+      {"close", "", "press the panel's close button (switches the panel off here)", &QelHostPanelCommands::Close},
+      {"minimize", "", "minimize the docked panel", &QelHostPanelCommands::Minimize},
+      {"restore", "", "show the minimized panel again", &QelHostPanelCommands::Restore},
+      {"panel", "[json]", "print the panel as a person sees it (or as JSON)", &QelHostPanelCommands::Panel},
+      {"widgets", "[json]", "the same as panel", &QelHostPanelCommands::Panel},
       {"display", "", "print the model with what is shown and hidden", &Display},
-      {"widgets", "[json]", "print the panel's facet widgets as a person sees them (or as JSON)", &Widgets},
+      {"window", "list|open K|activate N|close N", "the editor's windows (kinds 3d, 2dl, dft)", &QelHostPanelCommands::Window},
+      {"workbench", "[NAME]", "switch workbench (LumReview, TPSCfg, GopLookoutWorkbench have the panel)", &QelHostPanelCommands::Workbench},
+      {"setting", "KEY [INT]", "read or write a setting of QelRovDataFiltering", &QelHostPanelCommands::Setting},
+      {"close-editor", "", "close the open model's editor", &QelHostPanelCommands::CloseEditor},
+      {"select", "[NAME]", "select an object by name (none: empty the selection)", &QelHostPanelCommands::Select},
+      {"light-load", "PRODUCT on|off", "switch a product's light-load mode", &QelHostPanelCommands::LightLoad},
       {"thumbnail", "NAME FILE", "write the thumbnail of a view or capture as PNG (NAME \"*\": all, into a folder)", &Thumbnail},
       {"picture", "FILE", "write a picture of the whole model, as shown, as PNG", &Picture},
       {"help", "", "list the commands", &Help},

@@ -42,6 +42,7 @@ const char* QelHostOptions::Usage() {
          "  --list-module        list what the plug-in registered with the host\n"
          "  --script FILE        run the review session's commands from FILE (without it the\n"
          "                       session reads a terminal with a prompt, or standard input)\n"
+         "  --demo               run a short scripted review of the model with the panel\n"
          "  --setting REPO/KEY[=VALUE]\n"
          "                       print a user setting, or write and save it\n"
          "  -h, --help           show this help and exit\n"
@@ -139,6 +140,8 @@ bool QelHostOptions::Parse(const std::vector<std::string>& args, QelHostOptions&
       }
     } else if (arg == "--script") {
       if (!value(options.scriptPath)) return false;
+    } else if (arg == "--demo") {
+      options.demo = true;
     } else if (arg == "--list-module") {
       options.listModule = true;
     } else if (arg == "--setting") {

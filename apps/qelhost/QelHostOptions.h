@@ -32,6 +32,7 @@ struct QelHostOptions {
   std::string modulePath = "libQelRovFacets.so";
   bool listModule = false;
   std::string scriptPath;  // empty: the session reads the terminal or standard input
+  bool demo = false;       // the built-in review script instead
   std::vector<DisplayChange> displayChanges;
   bool defaultOnly = false;
   std::optional<QelToleranceRange> tolerance;

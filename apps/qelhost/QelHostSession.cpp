@@ -9,7 +9,9 @@
 #include <cstdlib>
 
 #include "QelApplicationFrame.h"
+#include "QelDelayedDestruction.h"
 #include "QelDictionary.h"
+#include "QelSettingRepository.h"
 #include "QelDlgNotify.h"
 #include "QelHostCommands.h"
 #include "QelIAlias.h"
@@ -38,7 +40,7 @@ bool ReadLine(const char* prompt, std::string& line) {
 
 QelHostSession::QelHostSession(std::ostream& out, std::ostream& err) : out_(out), err_(err) {
   // The questions the facets ask take the frame's main window as parent.
-  QelApplicationFrame::CreateFrame();
+  QelApplicationFrame::CreateFrame(QelString(kDefaultWorkbench));
   QelDlgNotify::SetRefusalReporter([this](const QelUnicodeString& report) { out_ << report.Utf8() << '\n'; });
 }
 
@@ -46,8 +48,12 @@ QelHostSession::~QelHostSession() {
   QelDlgNotify::SetRefusalReporter(nullptr);
   QelDlgNotify::SetAsker(nullptr);
   if (displayCallback_) QelCallbackManager::Get().RemoveCallback(displayCallback_);
-  review_ = nullptr;
+  controller_ = nullptr;
+  if (QelApplicationFrame* frame = QelApplicationFrame::GetFrame()) {
+    if (editor_) frame->GetLayout()->CloseEditor(editor_.get());
+  }
   if (window_) window_->SetViewer(nullptr);
+  QelDelayedDestruction::FlushIdle();
 }
 
 bool QelHostSession::Open(const std::string& path, std::string& error) {
@@ -59,16 +65,12 @@ bool QelHostSession::Open(const std::string& path, std::string& error) {
 }
 
 bool QelHostSession::Attach(const QelBaseUnknown_var& root, const std::string& name, std::string& error) {
-  auto review = QelInstantiateComponent<QelIRovFacetReview>("QelRovFacetReview");
-  if (!review) {
-    error = "the plug-in gives no facet review (is it loaded?)";
+  auto controller = QelInstantiateComponent<QelIHyxFacetCtrl>("QelRovFacetController");
+  if (!controller) {
+    error = "the plug-in gives no panel controller (is it loaded, is QEL_REFINEMENT_DEV 0?)";
     return false;
   }
   auto editor = QelMakeVar<QelFrmEditor>(root.get());
-  // The root is the UI-active object, as when a product is opened.
-  auto active = QelMakeVar<QelPathElement>();
-  active->AddChildElement(root.get());
-  editor->SetUIActivePath(active.get());
   if (displayCallback_) QelCallbackManager::Get().RemoveCallback(displayCallback_);
   displayCallback_ = QelRovFacetServices::AddDisplayChangeCallback(
       root.get(), editor.get(), [this](QelBaseUnknown*, QelBaseUnknown* object) {
@@ -76,31 +78,43 @@ bool QelHostSession::Attach(const QelBaseUnknown_var& root, const std::string& n
         QelBaseUnknown_var held(object);
         if (shownBefore_.emplace(held->GetImpl(), !IsShown(object)).second) changed_.push_back(held);
       });
-  review_ = nullptr;
   // The editor's 3D window, current in the frame's layout: what pictures are drawn from
   // and where thumbnails take their view modes.
   QelFrmLayout* layout = QelApplicationFrame::GetFrame()->GetLayout();
-  if (window_) {
-    window_->SetViewer(nullptr);
-    layout->RemoveWindow(window_.get());
-  }
+  // The model open before goes with its editor; the controller drops its panel.
+  if (editor_) layout->CloseEditor(editor_.get());
+  if (window_) window_->SetViewer(nullptr);
   auto window = QelMakeVar<Qel3DWindow>(editor.get());
   auto viewer = QelMakeVar<Qel3DViewer>(800, 600);
   viewer->SetSceneSource(QelMakeVar<QelModelScene>(root.get()).get());
   window->SetViewer(viewer.get());
   layout->AddWindow(window.get());
   layout->SetCurrentWindow(window.get());
+  // The root is the UI-active object, as when a product is opened; its editor is the
+  // current one by now, as listeners of the change expect.
+  auto active = QelMakeVar<QelPathElement>();
+  active->AddChildElement(root.get());
+  editor->SetUIActivePath(active.get());
   window_ = window;
   viewer_ = viewer;
   root_ = root;
   editor_ = editor;
-  review_ = review;
-  if (review_->Open(editor_.get()) != S_OK) {
-    error = "the facets could not be made";
-    return false;
-  }
+  controller_ = controller;
   out_ << "model " << name << " open\n";
+  SwitchPanelOnByDefault();
+  controller_->CreateDataFilteringPanelIfNecessary();
+  QelDelayedDestruction::FlushIdle();
   return true;
+}
+
+void QelHostSession::SwitchPanelOnByDefault() {
+  // A person who never switched the panel off in this workbench gets it; the choice is
+  // kept in memory only until someone saves the repository.
+  QelFrmContext* context = QelFrmContext::GetContext();
+  QelSettingRepository* repository = QelSettingRepository::GetRepository("QelRovDataFiltering");
+  if (!context || !repository) return;
+  const std::string key = std::string("DataFilteringPanel_") + context->GetWorkbenchName().CastToCharPtr();
+  if (!repository->IsPresent(key.c_str())) repository->WriteSetting(key.c_str(), 1, 1);
 }
 
 void QelHostSession::BeginChanges() {
@@ -131,7 +145,10 @@ bool QelHostSession::Execute(const std::string& line, std::string& error) {
   if (words.empty() || words[0][0] == '#') return true;
   for (const QelHostCommand& command : QelHostCommandTable()) {
     if (words[0] != command.name) continue;
-    if (command.run(*this, std::vector<std::string>(words.begin() + 1, words.end()), error)) return true;
+    const bool done = command.run(*this, std::vector<std::string>(words.begin() + 1, words.end()), error);
+    // The line is over: the host is idle.
+    QelDelayedDestruction::FlushIdle();
+    if (done) return true;
     error = words[0] + ": " + error;
     return false;
   }

@@ -1,7 +1,8 @@
 #pragma once
-// QelHostSession: qelhost's review session. It holds the open model, its editor and the
-// plug-in's facet review of that editor, and runs command lines (QelHostCommands) from a
-// terminal, a script file or standard input. A script stops at its first bad line; a
+// QelHostSession: qelhost's review session. It holds the open model, its editor and 3D
+// window, and the plug-in's panel controller, and runs command lines (QelHostCommands)
+// from a terminal, a script file or standard input. After every line the host is idle:
+// delayed destructions are done. A script stops at its first bad line; a
 // person at a terminal is told what was wrong and goes on.
 #include <istream>
 #include <map>
@@ -13,7 +14,10 @@
 #include "Qel3DWindow.h"
 #include "QelCallbackManager.h"
 #include "QelFrmEditor.h"
-#include "QelIRovFacetReview.h"
+#include "QelIHyxFacetCtrl.h"
+
+// The workbench a session starts in: one of those that have the panel.
+inline constexpr const char* kDefaultWorkbench = "LumReview";
 
 class QelHostSession {
  public:
@@ -22,9 +26,10 @@ class QelHostSession {
   QelHostSession(const QelHostSession&) = delete;
   QelHostSession& operator=(const QelHostSession&) = delete;
 
-  // Opens a model file (empty: the embedded sample) and the facets of its editor. False
-  // with `error` when the file or the plug-in's review cannot be had; the model open
-  // before stays open then.
+  // Opens a model file (empty: the embedded sample) in a new editor and 3D window, which
+  // replace the open ones, and asks the plug-in's controller for the panel. False with
+  // `error` when the file or the controller cannot be had; the model open before stays
+  // open then.
   bool Open(const std::string& path, std::string& error);
   // Takes a model already loaded as the open one.
   bool Attach(const QelBaseUnknown_var& root, const std::string& name, std::string& error);
@@ -43,7 +48,8 @@ class QelHostSession {
 
   std::ostream& Out() { return out_; }
   QelBaseUnknown* Root() const { return root_.get(); }
-  QelIRovFacetReview* Review() const { return review_.get(); }
+  QelFrmEditor* Editor() const { return editor_.get(); }
+  QelIHyxFacetCtrl* Controller() const { return controller_.get(); }
   // The open model's 3D viewer, in the current window.
   Qel3DViewer* Viewer() const { return viewer_.get(); }
 
@@ -53,13 +59,15 @@ class QelHostSession {
   void EndChanges();
 
  private:
+  void SwitchPanelOnByDefault();
+
   std::ostream& out_;
   std::ostream& err_;
   QelBaseUnknown_var root_;
   QelVar<QelFrmEditor> editor_;
   QelVar<Qel3DWindow> window_;
   QelVar<Qel3DViewer> viewer_;
-  QelVar<QelIRovFacetReview> review_;
+  QelVar<QelIHyxFacetCtrl> controller_;
   QelCallbackId displayCallback_ = 0;
   bool recording_ = false;
   std::vector<QelBaseUnknown_var> changed_;           // in order of first change

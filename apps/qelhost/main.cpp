@@ -6,11 +6,13 @@
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
+#include <sstream>
 #include <iostream>
 #include <string>
 #include <vector>
 
 #include "QelDictionary.h"
+#include "QelHostDemo.h"
 #include "QelHostOptions.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
@@ -116,9 +118,18 @@ int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
   QelHostSession session(std::cout, std::cerr);
   std::string error;
   const std::string name = options.modelPath.empty() ? kQelSampleProductName : options.modelPath;
+  if (options.demo)
+    // The panel is part of the show whatever this workbench's setting says; the value is
+    // not saved.
+    if (QelSettingRepository* repository = QelSettingRepository::GetRepository("QelRovDataFiltering"))
+      repository->WriteSetting((std::string("DataFilteringPanel_") + kDefaultWorkbench).c_str(), 1, 1);
   if (!session.Attach(root, name, error)) {
     std::fprintf(stderr, "qelhost: %s\n", error.c_str());
     return 1;
+  }
+  if (options.demo) {
+    std::istringstream script(kQelHostDemoScript);
+    return session.RunScript(script, "demo");
   }
   if (!options.scriptPath.empty()) {
     std::ifstream script(options.scriptPath);
@@ -130,7 +141,12 @@ int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
   }
   // A terminal on both sides is a person; a terminal that nobody reads the answers of
   // (output captured by a test runner or a file) gets no session rather than a wait.
-  if (isatty(STDIN_FILENO)) return isatty(STDOUT_FILENO) ? session.RunInteractive() : 0;
+  if (isatty(STDIN_FILENO)) {
+    if (!isatty(STDOUT_FILENO)) return 0;
+    // A person starts with the panel in view.
+    session.Execute("panel", error);
+    return session.RunInteractive();
+  }
   return session.RunScript(std::cin, "stdin");
 }
 }  // namespace

@@ -132,6 +132,41 @@ TEST_F(QelRovFacetGroupDependents, ViewChangeClearsTheSwitchesAndRefreshesTypes)
   EXPECT_EQ(views->refreshes, 1);
 }
 
+// A type facet that notes the filter switches it finds when it is refreshed.
+class SwitchNotingFacet final : public TestFacet {
+ public:
+  SwitchNotingFacet(QelBaseUnknown* group, QelRovFacetFilterData* filter) : TestFacet(group), filter_(filter) {}
+  void Refresh() override {
+    TestFacet::Refresh();
+    sawSwitchOn = filter_->DefaultAnnot || filter_->TolAnnot;
+  }
+  bool sawSwitchOn = true;
+
+ private:
+  ~SwitchNotingFacet() override = default;
+  QelRovFacetFilterData* filter_;
+};
+
+TEST(QelRovFacetGroupDependentsOrder, SwitchesAreOffBeforeTypesRefreshAndForeignChangesAreRefused) {
+  QelAssertionCapture capture;
+  auto editor = EditorOn(nullptr);
+  auto group = Make<TestFacetGroup>(editor.get());
+  auto filter = Make<QelRovFacetFilterData>();
+  auto sets = Make<TestFacet>(group.get());
+  auto views = Make<TestFacet>(group.get());
+  auto types = Make<SwitchNotingFacet>(group.get(), filter.get());
+  group->SetFacets(sets.get(), views.get(), types.get(), filter.get());
+  filter->DefaultAnnot = filter->TolAnnot = true;
+  EXPECT_EQ(group->OnPropertyChanged(views.get()), S_OK);
+  EXPECT_FALSE(types->sawSwitchOn);
+
+  auto foreign = Make<TestFacet>(group.get());
+  EXPECT_EQ(group->OnPropertyChanged(foreign.get()), E_UNEXPECTED);
+  EXPECT_EQ(capture.Count(kQelAssertKindBool), 1);
+  EXPECT_EQ(views->refreshes + sets->refreshes, 0);
+  EXPECT_EQ(types->refreshes, 1);
+}
+
 TEST_F(QelRovFacetGroupDependents, LoadModeChangeRebuildsEveryFacetWithoutRefreshingIt) {
   EXPECT_EQ(group->OnLightLoadModeChanged(), S_OK);
   EXPECT_EQ(sets->rebuilds + views->rebuilds + types->rebuilds, 3);

@@ -1,7 +1,14 @@
 #include "QelRovFacetGroup.h"
 
 #include "QelAssert.h"
+#include "QelDbrFraPanel.h"
+#include "QelDelayedDestruction.h"
 #include "QelFrmEditor.h"
+#include "QelFrmLayout.h"
+#include "QelMsgCatalog.h"
+#include "QelRovRefinementDlg.h"
+#include "QelSYP.h"
+#include "QelVidCtlButton.h"
 #include "QelILumLightLoadModeObservable.h"
 #include "QelILumLightLoadModeObserver.h"
 #include "QelILumSet.h"
@@ -34,7 +41,10 @@ QelRovFacetGroup::QelRovFacetGroup(QelFrmEditor* editor) : editor_(editor) {
 }
 
 QelRovFacetGroup::~QelRovFacetGroup() {
-  // The panel and its dialog come with the panel behaviour; until then they stay null.
+  if (panel_) {
+    panel_->SetVisibleFlag(0);
+    panel_->RequestDelayedDestruction();
+  }
   panel_ = nullptr;
   dialog_ = nullptr;
   filterData_ = nullptr;
@@ -221,6 +231,137 @@ HRESULT QelRovFacetGroup::OnLightLoadModeChanged() {
   annotationSetFacet_->Rebuild();
   viewFacet_->Rebuild();
   if (annotationTypeFacet_) annotationTypeFacet_->Rebuild();
-  // Rebuilding the dialog's widgets comes with the panel behaviour.
+  if (dialog_) dialog_->RefreshFacetWidgets();
   return S_OK;
+}
+
+namespace {
+constexpr int kAllowedDockAreas = 0x18;
+constexpr int kDockArea = 0x10;
+
+// The window the panel goes into: the current one, or, from a 2D layout window, the first
+// other window of the editor that is not one. Null when there is none.
+QelFrmWindow* TargetWindow(QelFrmLayout* layout, QelFrmWindow* current, QelFrmEditor* editor) {
+  if (!current->IsAKindOf("Qel2DLWindow")) return current;
+  QelListValQelBaseUnknown_var windows = layout->GetWindowList(nullptr, nullptr);
+  for (int i = 1; i <= windows.Size(); ++i) {
+    auto* window = QelSysDynamicCast<QelFrmWindow>(windows[i].get());
+    if (!window) {
+      QelAssertPointer("QelFrmWindow");
+      continue;
+    }
+    if (window->GetEditor() && window->GetEditor()->IsEqual(editor) && !window->IsAKindOf("Qel2DLWindow"))
+      return window;
+  }
+  return nullptr;
+}
+}  // namespace
+
+QelVar<QelRovRefinementDlg> QelRovFacetGroup::MakeDialog() {
+  InitFacets();
+  QelListValQelBaseUnknown_var facets;
+  ListFacets(facets);
+  return QelMakeVar<QelRovRefinementDlg>(nullptr, QelString("QelRovRefinementDlg"), facets, GetEditor());
+}
+
+HRESULT QelRovFacetGroup::CreatePanel() {
+  QelFrmLayout* layout = QelFrmLayout::GetCurrentLayout();
+  if (!layout) {
+    QelAssertPointer("QelFrmLayout");
+    return E_UNEXPECTED;
+  }
+  QelFrmWindow* current = layout->GetCurrentWindow();
+  if (!current) {
+    QelAssertPointer("QelFrmWindow");
+    return E_UNEXPECTED;
+  }
+  QelFrmEditor* editor = GetEditor();
+  if (current->IsAKindOf("Qel2DLWindow") && !editor) {
+    QelAssertPointer("QelFrmEditor");
+    return E_UNEXPECTED;
+  }
+  if (!current->IsAKindOf("Qel2DLWindow") && current->IsAKindOf("QelDftWindow")) return kDraftingWindow;
+  QelFrmWindow* target = TargetWindow(layout, current, editor);
+  if (dialog_ || panel_ || !target) return S_FALSE;
+  QelVar<QelFrmWindow> holdTarget = QelVar<QelFrmWindow>::Retain(target);
+
+  QelVar<QelRovRefinementDlg> dialog = MakeDialog();
+  dialog_ = dialog.get();
+  if (dialog->BuildFacetWidgets() < 0) {
+    QelAssertBool("BuildFacetWidgets");
+    // Nothing holds a dialog without a panel; keep it so the state stays as reported.
+    orphanDialog_ = dialog;
+    return E_UNEXPECTED;
+  }
+  panel_ = QelMakeVar<QelDbrFraPanel>(nullptr, QelString("QelRovRefinementFraPanel"), dialog.get(), kAllowedDockAreas,
+                                      kDockArea, true);
+  panel_->SetTitle(QelMsgCatalog::BuildMessage("QelRovRefinementCmd", "Title"));
+  panel_->SetCloseButtonFlag(0);
+  panel_->SetMinimizeButtonFlag(1);
+  panel_->SetVisibleFlag(1);
+  panel_->SetIconName(QelString("I_Hyq_DataFilteringCmd"));
+  panel_->SetDefaultButton(dialog->GetCloseButton());
+
+  QelBaseUnknown_var viewer = target->GetViewer();
+  if (!viewer) {
+    QelAssertPointer("viewer");
+    return E_UNEXPECTED;
+  }
+  panel_->InsertInViewer(viewer.get());
+  if (!editor) {
+    QelAssertPointer("QelFrmEditor");
+    return E_UNEXPECTED;
+  }
+  QelCSO* selection = editor->GetCSO();
+  if (!selection) {
+    QelAssertPointer("CSO");
+    return E_UNEXPECTED;
+  }
+  if (!csoSubscription_) {
+    QelBaseUnknown_WR self(static_cast<QelBaseUnknown*>(this));
+    csoSubscription_ = QelCallbackManager::Get().AddCallback(
+        selection, kCSOChanged, this, [self](QelBaseUnknown*, QelBaseUnknown*) {
+          QelBaseUnknown_var held = self.Get();
+          if (auto* group = QelSysDynamicCast<QelRovFacetGroup>(held.get())) group->OnCSOChanged();
+        });
+  }
+  AddLightLoadModeObservers();
+  return S_OK;
+}
+
+void QelRovFacetGroup::ClosePanel() {
+  if (panel_) {
+    panel_->SetVisibleFlag(0);
+    panel_->RequestDelayedDestruction();
+  }
+  panel_ = nullptr;
+  dialog_ = nullptr;
+  orphanDialog_ = nullptr;
+}
+
+void QelRovFacetGroup::ShowPanel(bool show) {
+  if (panel_) panel_->SetVisibleFlag(show ? 1 : 0);
+}
+
+void QelRovFacetGroup::RefreshPanel() {
+  if (!panel_) return;
+  QelBaseUnknown_var self = QelBaseUnknown_var::Retain(this);
+  QelVar<QelRovRefinementDlg> dialog = MakeDialog();
+  if (dialog->BuildFacetWidgets() < 0) return QelAssertBool("BuildFacetWidgets");
+  // The old dialog may be the one whose button asked for this: it is held until the
+  // host is idle.
+  QelVar<QelRovRefinementDlg> old = QelVar<QelRovRefinementDlg>::Retain(dialog_);
+  panel_->SetApplicativeWidget(dialog.get());
+  panel_->SetDefaultButton(dialog->GetCloseButton());
+  if (!old) {
+    QelAssertPointer("QelRovRefinementDlg");
+    return;
+  }
+  QelDelayedDestruction::Request(old.get());
+  dialog_ = dialog.get();
+  QelSYP::LoadResources(static_cast<QelBaseUnknown*>(dialog.get()));
+}
+
+void QelRovFacetGroup::OnCSOChanged() {
+  if (dialog_) dialog_->SetRefreshButtonEnableFlag(1);
 }

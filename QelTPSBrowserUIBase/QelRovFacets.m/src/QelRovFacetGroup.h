@@ -1,9 +1,9 @@
 #pragma once
-// QelRovFacetGroup: everything the data filtering panel of one editor needs, starting
-// with its record: the editor (held weakly: a group may outlive it), the facets and the
-// filter data (owned), the
-// panel and its dialog, and the light-load-mode observables it subscribed to. It is the
-// observer of its facets, which hold it weakly, and of those observables.
+// QelRovFacetGroup: everything the data filtering panel of one editor needs: the editor
+// (held weakly: a group may outlive it), the facets and the filter data (owned), the
+// docked panel (held; the panel holds the dialog) and the light-load-mode observables it
+// subscribed to. It is the observer of its facets, which hold it weakly, and of those
+// observables. A group that goes hides its panel and hands it to delayed destruction.
 #include "QelBaseUnknown_WR.h"
 #include "QelCallbackManager.h"
 #include "QelListValQelBaseUnknown_var.h"
@@ -17,6 +17,9 @@ class QelDbrFraPanel;
 
 class QelRovFacetGroup : public virtual QelBaseUnknown {
  public:
+  // CreatePanel's answer for a drafting window, where no panel is made.
+  static constexpr HRESULT kDraftingWindow = 0x40202;
+
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override;
 
@@ -40,6 +43,21 @@ class QelRovFacetGroup : public virtual QelBaseUnknown {
   // `facets` must be empty.
   HRESULT ListFacets(QelListValQelBaseUnknown_var& facets);
 
+  // Builds the facets, the dialog and the docked panel in a 3D window of the editor: S_OK
+  // when built now, S_FALSE when nothing was built (already there, or no window of the
+  // editor can take it), kDraftingWindow, or E_UNEXPECTED.
+  HRESULT CreatePanel();
+  // Hides the panel and has it destroyed; the facets and subscriptions stay.
+  void ClosePanel();
+  void ShowPanel(bool show);
+  bool IsPanelInitialized() const { return panel_ && dialog_; }
+  // A new dialog over the refreshed facets in the existing panel.
+  void RefreshPanel();
+  // The editor's selection changed: the dialog offers a refresh.
+  void OnCSOChanged();
+  QelRovRefinementDlg* GetDialog() const { return dialog_; }
+  QelDbrFraPanel* GetPanel() const { return panel_.get(); }
+
   // Subscribes to the light-load mode of the owners of the light sets under the root,
   // once: nothing happens while subscriptions exist.
   void AddLightLoadModeObservers();
@@ -61,6 +79,9 @@ class QelRovFacetGroup : public virtual QelBaseUnknown {
                  QelRovFacetFilterData* filterData);
 
  private:
+  // InitFacets, then a dialog over the listed facets, its template applied.
+  QelVar<QelRovRefinementDlg> MakeDialog();
+
   QelBaseUnknown_WR editor_;
   QelVar<QelRovFacet> annotationSetFacet_;
   QelVar<QelRovFacet> viewFacet_;
@@ -68,7 +89,11 @@ class QelRovFacetGroup : public virtual QelBaseUnknown {
   QelVar<QelRovFacetFilterData> filterData_;
   // Held by the panel, not by the group.
   QelRovRefinementDlg* dialog_ = nullptr;
-  QelDbrFraPanel* panel_ = nullptr;
+  // The viewer's dock holds the panel too; the group's own reference keeps the dialog
+  // pointer sound while the panel is not docked.
+  QelVar<QelDbrFraPanel> panel_;
+  // A dialog whose widgets failed to build, kept until ClosePanel forgets it.
+  QelVar<QelRovRefinementDlg> orphanDialog_;
   QelListValQelBaseUnknown_var observables_;
   QelCallbackId csoSubscription_ = 0;
 };

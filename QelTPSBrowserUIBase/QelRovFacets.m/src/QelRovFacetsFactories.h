@@ -11,4 +11,5 @@ QelBaseUnknown* CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup(QelBaseUnk
 QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotationSet(QelBaseUnknown* impl);
 QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetView(QelBaseUnknown* impl);
 QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotation(QelBaseUnknown* impl);
+QelBaseUnknown* CreateBOAQelIHyxFacetCtrlQelRovFacetController(QelBaseUnknown* impl);
 }

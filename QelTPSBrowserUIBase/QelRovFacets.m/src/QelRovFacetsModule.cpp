@@ -1,7 +1,9 @@
 // Load-time entry of the module. Registration of the module's classes runs here, once,
 // from the one initialiser below, in the order the host expects; entries for classes
 // still to come take their place in that order as they arrive.
+#include "QelDelayedDestruction.h"
 #include "QelDictionary.h"
+#include "QelIHyxFacetCtrl.h"
 #include "QelILumCapture.h"
 #include "QelILumGeometry.h"
 #include "QelILumLightLoadModeObservable.h"
@@ -18,14 +20,20 @@
 #include "QelRovFacet.h"
 #include "QelRovFacetAnnotation.h"
 #include "QelRovFacetAnnotationSet.h"
-#include "QelRovFacetReview.h"
+#include "QelRovFacetController.h"
 #include "QelRovFacetView.h"
-#include "QelIRovFacetReview.h"
 #include "QelRovFacetGroup.h"
 #include "QelRovFacetProperty.h"
 #include "QelRovFacetPropertyGroup.h"
 #include "QelRovFacetPropertyItem.h"
 #include "QelRovFacetsFactories.h"
+
+// The controller answers QelIHyxFacetCtrl itself; it is only ever made by name.
+extern "C" QelBaseUnknown* CreateBOAQelIHyxFacetCtrlQelRovFacetController(QelBaseUnknown* impl) {
+  if (impl) impl->AddRef();
+  return impl;
+}
+#include "QelRovRefinementDlgSYPIntro.h"
 #include "QelRovRefinementFacetSYPIntro.h"
 #include "QelRovRefinementPropertySYPIntro.h"
 #include "QelSYPMetaClassBuilder.h"
@@ -46,6 +54,12 @@ void QelRovFacetsRegister() {
   QelRovFacetProperty::MetaObject();
   QelRovFacetPropertyItem::MetaObject();
 
+  // The facet controller: made by name, answering QelIHyxFacetCtrl itself. Its exit
+  // action is the loader's destructor below.
+  dictionary.RegisterNamedCreator(QelRovFacetController::ClassName(), &QelRovFacetController::Create, kFramework);
+  dictionary.Register(QelRovFacetController::ClassName(), QelIHyxFacetCtrl::IID,
+                      &CreateBOAQelIHyxFacetCtrlQelRovFacetController, kFramework);
+
   // The facet group.
   dictionary.Register(QelRovFacetGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
                       &CreateTIEQelIRovFacetPropertyObserverQelRovFacetGroup, kFramework);
@@ -60,16 +74,12 @@ void QelRovFacetsRegister() {
   dictionary.Register(QelRovFacetView::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
                       &CreateTIEQelIRovFacetPropertyObserverQelRovFacetView, kFramework);
 
-  // The facets of one editor for host programs without widgets.
-  dictionary.RegisterNamedCreator("QelRovFacetReview", &QelRovFacetReview::Create, kFramework);
-
   // The property group.
   dictionary.Register(QelRovFacetPropertyGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
                       &CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup, kFramework);
 
   // The interfaces: the module's own, then the host's that it queries or implements.
   DescribeInterface<QelIRovFacetPropertyObserver>("QelIRovFacetPropertyObserver");
-  DescribeInterface<QelIRovFacetReview>("QelIRovFacetReview");
   DescribeInterface<QelITPSView>("QelITPSView");
   DescribeInterface<QelITPS>("QelITPS");
   DescribeInterface<QelILumSet>("QelILumSet");
@@ -82,6 +92,8 @@ void QelRovFacetsRegister() {
   DescribeInterface<QelITPSLight>("QelITPSLight");
 
   // The introspection builders of the panel widgets.
+  QelSYPMetaClassBuilder::Register("QelRovRefinementDlgSYPMetaClassBuilder",
+                                   &fctCreateQelRovRefinementDlgSYPMetaClassBuilder, kFramework);
   QelSYPMetaClassBuilder::Register("QelRovRefinementFacetSYPMetaClassBuilder",
                                    &fctCreateQelRovRefinementFacetSYPMetaClassBuilder, kFramework);
   QelSYPMetaClassBuilder::Register("QelRovRefinementPropertySYPMetaClassBuilder",
@@ -93,6 +105,9 @@ void QelRovFacetsRegister() {
 struct QelRovFacetsLoader {
   QelRovFacetsLoader() { QelRovFacetsRegister(); }
   ~QelRovFacetsLoader() {
+    QelRovFacetController::ReleaseAtUnload();
+    // Panels and dialogs queued for release run the module's code: they go before it does.
+    while (QelDelayedDestruction::PendingCount() > 0) QelDelayedDestruction::FlushIdle();
     QelDictionary::Get().RemoveFramework(kFramework);
     QelSYPMetaClassBuilder::RemoveFramework(kFramework);
   }

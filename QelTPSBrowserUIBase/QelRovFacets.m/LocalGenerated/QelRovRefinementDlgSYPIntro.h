@@ -1,0 +1,6 @@
+#pragma once
+// Introspection table of QelRovRefinementDlg, registered under
+// "QelRovRefinementDlgSYPMetaClassBuilder".
+#include "QelBaseUnknown.h"
+
+extern "C" QelBaseUnknown* fctCreateQelRovRefinementDlgSYPMetaClassBuilder();
