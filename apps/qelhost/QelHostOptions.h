@@ -32,6 +32,7 @@ struct QelHostOptions {
   std::string modulePath = "libQelRovFacets.so";
   bool listModule = false;
   std::string scriptPath;  // empty: the session reads the terminal or standard input
+  std::string exportJsonPath;  // not empty: write the model there as a JSON model file and stop
   std::vector<DisplayChange> displayChanges;
   bool defaultOnly = false;
   std::optional<QelToleranceRange> tolerance;
