@@ -330,7 +330,8 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
       from = eye + sight * (depth - reach);
       distance = reach;
     }
-    builder_.AddCapture(set, {.alias = name,
+    // Named apart from its view, so that a person can tell the two in the panel and files.
+    builder_.AddCapture(set, {.alias = name + " Capture",
                               .view = made.get(),
                               .camera = QelModelCameraDesc{from, from + sight * distance, up}});
     ++viewCount_;
