@@ -319,21 +319,21 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     QelModelViewDesc viewDesc{.alias = name, .plane = QelMathPlane(eye, -sight, right, up), .elements = elements};
     QelBaseUnknown_var set = SetFor(owner);
     QelBaseUnknown_var made = builder_.AddView(set, viewDesc);
-    // A parallel projection keeps its picture whatever the eye's place along the line of
-    // sight; such an eye is put back on that line so that a perspective viewer sees the
-    // whole scene in front of it (a 30-degree field needs about twice the scene's size).
-    const double depth = (sceneCentre - eye).Dot(sight);
+    // A parallel projection keeps its picture wherever the eye stands along the line of
+    // sight, and the translator does not give where the view's window lies in its plane:
+    // such a camera looks at the scene's centre from twice the scene's size, so that a
+    // perspective viewer (30-degree field) sees the whole part in the middle.
     const double reach = sceneSize > 0.0 ? 2.0 * sceneSize : 1.0;
     QelMathPoint from = eye;
-    double distance = depth > 0.0 ? depth : reach;
+    QelMathPoint to = eye + sight * std::max((sceneCentre - eye).Dot(sight), reach);
     if (object->Type() == XCAFView_ProjectionType_Parallel) {
-      from = eye + sight * (depth - reach);
-      distance = reach;
+      from = sceneCentre - sight * reach;
+      to = sceneCentre;
     }
     // Named apart from its view, so that a person can tell the two in the panel and files.
     builder_.AddCapture(set, {.alias = name + " Capture",
                               .view = made.get(),
-                              .camera = QelModelCameraDesc{from, from + sight * distance, up}});
+                              .camera = QelModelCameraDesc{from, to, up}});
     ++viewCount_;
   }
 }
