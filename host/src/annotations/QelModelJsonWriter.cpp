@@ -73,8 +73,6 @@ class Writer {
     j["shown"] = s->IsShown();
     Json annotations = Json::array(), views = Json::array(), captures = Json::array();
     for (const auto& a : s->Annotations()) annotations.push_back(Annotation(a.get()));
-    // Views may refer to views declared after them (references, related): name them all first.
-    for (const auto& v : s->Views()) Id(v.get(), "v", views_);
     for (const auto& v : s->Views()) views.push_back(View(v.get()));
     for (const auto& c : s->Captures()) captures.push_back(Capture(c.get()));
     j["annotations"] = std::move(annotations);
@@ -89,8 +87,8 @@ class Writer {
     return j;
   }
 
-  // Views referring to views of later sets are named on the fly; every view is declared
-  // before the loader meets a reference only when the sets come in order, which they do.
+  // Every view is named before any set is written: a view may refer to views (reference
+  // or related views) that come later in the model.
   void NameViews(QelAnnotationModel* model) {
     for (const auto& s : model->Sets())
       for (const auto& v : s->Views()) Id(v.get(), "v", views_);

@@ -90,13 +90,15 @@ QelMathTransformation Placement(const gp_Trsf& t) {
 // the products that show its shape.
 class ProductWalker {
  public:
-  ProductWalker(const Handle(XCAFDoc_ShapeTool)& shapes, QelModelBuilder& builder) : shapes_(shapes), builder_(builder) {}
+  explicit ProductWalker(QelModelBuilder& builder) : builder_(builder) {}
 
   void Walk(const TDF_Label& prototype, const QelBaseUnknown_var& product, int depth) {
-    productOf.emplace(Entry(prototype), product);
+    const std::string entry = Entry(prototype);
+    productOf.emplace(entry, product);
     if (!XCAFDoc_ShapeTool::IsAssembly(prototype)) {
-      parts[Entry(prototype)].products.push_back(product);
-      parts[Entry(prototype)].label = prototype;
+      Part& part = parts[entry];
+      part.label = prototype;
+      part.products.push_back(product);
       return;
     }
     if (depth >= kMaxProductDepth) throw std::runtime_error("products nested more than 200 levels deep");
@@ -122,7 +124,6 @@ class ProductWalker {
   std::unordered_map<std::string, Part> parts;
 
  private:
-  Handle(XCAFDoc_ShapeTool) shapes_;
   QelModelBuilder& builder_;
   int unnamed_ = 0;
 };
@@ -215,7 +216,7 @@ HRESULT QelStepImporter::ImportFile(const std::string& path, QelBaseUnknown_var&
     if (rootAlias.empty()) rootAlias = std::filesystem::path(path).stem().string();
     QelModelBuilder builder({.alias = rootAlias});
     builder.SetSourceName(path);
-    ProductWalker walker(shapes, builder);
+    ProductWalker walker(builder);
     if (free.Length() == 1) {
       walker.Walk(free.First(), builder.Root(), 0);
     } else {
