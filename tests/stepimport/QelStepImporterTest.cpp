@@ -146,6 +146,10 @@ TEST(QelStepImporterTest, Stc06OpensWithItsAnnotationsAndNoView) {
   EXPECT_EQ(WithCode(set, 3).size(), 6u) << "datums A to F";
   EXPECT_GT(WithCode(set, 5).size(), 20u);
   EXPECT_GT(Triangles(model["root"]), 1000u);
+  // This file draws its annotations: their frames and leaders become drawing segments.
+  size_t drawn = 0;
+  for (const Json& a : set["annotations"]) drawn += a.contains("segments") ? 1 : 0;
+  EXPECT_GT(drawn, set["annotations"].size() / 2);
 }
 
 // The JSON model file of an import loads back to a model that writes out the same, so

@@ -6,7 +6,13 @@
 #include <map>
 #include <tuple>
 
+#include <BRep_Tool.hxx>
+#include <Geom_Curve.hxx>
+#include <Geom_Line.hxx>
 #include <TCollection_HAsciiString.hxx>
+#include <TopExp_Explorer.hxx>
+#include <TopoDS.hxx>
+#include <TopoDS_Edge.hxx>
 #include <TDF_LabelSequence.hxx>
 #include <TDF_Tool.hxx>
 #include <XCAFDimTolObjects_DatumObject.hxx>
@@ -109,6 +115,33 @@ std::string Number(double value) {
   return text;
 }
 
+// The lines of an annotation's graphic presentation (its frame, leaders and text strokes)
+// as segments: a straight edge as one, a curved one as kCurvePieces. A presentation of
+// more than kMaxSegments is cut there, so one odd annotation cannot swamp a picture.
+constexpr int kCurvePieces = 12;
+constexpr size_t kMaxSegments = 4000;
+
+std::vector<QelModelSegment> Segments(const TopoDS_Shape& presentation) {
+  std::vector<QelModelSegment> out;
+  if (presentation.IsNull()) return out;
+  for (TopExp_Explorer edges(presentation, TopAbs_EDGE); edges.More() && out.size() < kMaxSegments; edges.Next()) {
+    const TopoDS_Edge& edge = TopoDS::Edge(edges.Current());
+    TopLoc_Location location;
+    double first = 0.0, last = 0.0;
+    const Handle(Geom_Curve) curve = BRep_Tool::Curve(edge, location, first, last);
+    if (curve.IsNull() || !std::isfinite(first) || !std::isfinite(last)) continue;
+    const gp_Trsf& place = location.Transformation();
+    const int pieces = curve->IsKind(STANDARD_TYPE(Geom_Line)) ? 1 : kCurvePieces;
+    gp_Pnt from = curve->Value(first).Transformed(place);
+    for (int i = 1; i <= pieces && out.size() < kMaxSegments; ++i) {
+      const gp_Pnt to = curve->Value(first + (last - first) * i / pieces).Transformed(place);
+      out.push_back({{from.X(), from.Y(), from.Z()}, {to.X(), to.Y(), to.Z()}});
+      from = to;
+    }
+  }
+  return out;
+}
+
 // Where an annotation is drawn: its text, else its plane's origin, else its attachment point.
 template <class Object>
 QelMathPoint Anchor(const Object& object, bool hasText, const gp_Pnt& text) {
@@ -180,6 +213,7 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     p.desc.subTypeName = "Datum " + letter;
     p.desc.typeCode = 3;
     p.desc.anchor = Anchor(object, object->HasPointText(), object->GetPointTextAttach());
+    p.desc.segments = Segments(object->GetPresentation());
     pending.push_back(std::move(p));
   }
 
@@ -201,6 +235,7 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     p.desc.typeCode = 5;
     p.desc.tolerance = value;
     p.desc.anchor = Anchor(object, object->HasPointText(), object->GetPointTextAttach());
+    p.desc.segments = Segments(object->GetPresentation());
     pending.push_back(std::move(p));
   }
 
@@ -239,6 +274,7 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     }
     p.desc.navigationNames = {p.desc.alias};
     p.desc.anchor = Anchor(object, object->HasTextPoint(), object->GetPointTextAttach());
+    p.desc.segments = Segments(object->GetPresentation());
     pending.push_back(std::move(p));
   }
 
