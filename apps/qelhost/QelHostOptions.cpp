@@ -40,6 +40,7 @@ const char* QelHostOptions::Usage() {
          "                       0.05<=t<0.2, t<=0.1, 0.1<t, t=0.05, or any\n"
          "  --module FILE        the plug-in to load (default libQelRovFacets.so, next to qelhost)\n"
          "  --list-module        list what the plug-in registered with the host\n"
+         "  --export-json FILE   write the model (JSON or STEP) to FILE as a JSON model file and stop\n"
          "  --script FILE        run the review session's commands from FILE (without it the\n"
          "                       session reads a terminal with a prompt, or standard input)\n"
          "  --demo               run a short scripted review of the model with the panel\n"
@@ -142,6 +143,12 @@ bool QelHostOptions::Parse(const std::vector<std::string>& args, QelHostOptions&
       if (!value(options.scriptPath)) return false;
     } else if (arg == "--demo") {
       options.demo = true;
+    } else if (arg == "--export-json") {
+      if (!value(options.exportJsonPath)) return false;
+      if (options.exportJsonPath.empty()) {
+        error = "option '--export-json' needs a file name, not an empty text";
+        return false;
+      }
     } else if (arg == "--list-module") {
       options.listModule = true;
     } else if (arg == "--setting") {

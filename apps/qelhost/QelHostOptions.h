@@ -33,6 +33,7 @@ struct QelHostOptions {
   bool listModule = false;
   std::string scriptPath;  // empty: the session reads the terminal or standard input
   bool demo = false;       // the built-in review script instead
+  std::string exportJsonPath;  // not empty: write the model there as a JSON model file and stop
   std::vector<DisplayChange> displayChanges;
   bool defaultOnly = false;
   std::optional<QelToleranceRange> tolerance;

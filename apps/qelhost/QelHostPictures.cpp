@@ -5,6 +5,7 @@
 #include <cctype>
 #include <cstdio>
 #include <filesystem>
+#include <iostream>
 
 #include "Qel3DViewer.h"
 #include "Qel3DWindow.h"
@@ -16,6 +17,7 @@
 #include "QelILumCapture.h"
 #include "QelILumSetComponent.h"
 #include "QelITPSView.h"
+#include "QelHostModelFiles.h"
 #include "QelModelLoader.h"
 #include "QelModelObject.h"
 #include "QelUnicodeString.h"
@@ -93,7 +95,7 @@ int Produce(const std::vector<Request>& thumbnails, const std::vector<std::strin
   std::string error;
   QelBaseUnknown_var root;
   if ((modelPath.empty() ? QelModelLoader::LoadText(sampleText, sampleName, root, error)
-                         : QelModelLoader::LoadFile(modelPath, root, error)) != S_OK) {
+                         : QelHostModelFiles::Load(modelPath, root, error, std::cout)) != S_OK) {
     std::fprintf(stderr, "qelhost: %s\n", error.c_str());
     return 1;
   }

@@ -15,6 +15,7 @@
 #include "QelDlgNotify.h"
 #include "QelHostCommands.h"
 #include "QelIAlias.h"
+#include "QelHostModelFiles.h"
 #include "QelModelLoader.h"
 #include "QelRovFacetServices.h"
 #include "QelSampleProduct.h"
@@ -59,7 +60,7 @@ QelHostSession::~QelHostSession() {
 bool QelHostSession::Open(const std::string& path, std::string& error) {
   QelBaseUnknown_var root;
   const HRESULT loaded = path.empty() ? QelModelLoader::LoadText(kQelSampleProductText, kQelSampleProductName, root, error)
-                                      : QelModelLoader::LoadFile(path, root, error);
+                                      : QelHostModelFiles::Load(path, root, error, out_);
   if (loaded != S_OK) return false;
   return Attach(root, path.empty() ? kQelSampleProductName : path, error);
 }

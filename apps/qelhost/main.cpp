@@ -13,6 +13,7 @@
 
 #include "QelDictionary.h"
 #include "QelHostDemo.h"
+#include "QelHostModelFiles.h"
 #include "QelHostOptions.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
@@ -175,10 +176,18 @@ int main(int argc, char** argv) {
   QelBaseUnknown_var root;
   HRESULT loaded = options.modelPath.empty()
                        ? QelModelLoader::LoadText(kQelSampleProductText, kQelSampleProductName, root, error)
-                       : QelModelLoader::LoadFile(options.modelPath, root, error);
+                       : QelHostModelFiles::Load(options.modelPath, root, error, std::cout);
   if (loaded != S_OK) {
     std::fprintf(stderr, "qelhost: %s\n", error.c_str());
     return 1;
+  }
+  if (!options.exportJsonPath.empty()) {
+    if (!QelHostModelFiles::ExportJson(root.get(), options.exportJsonPath, error)) {
+      std::fprintf(stderr, "qelhost: %s\n", error.c_str());
+      return 1;
+    }
+    std::printf("model written to %s\n", options.exportJsonPath.c_str());
+    return 0;
   }
   std::printf("model %s\n", options.modelPath.empty() ? kQelSampleProductName : options.modelPath.c_str());
   if (!LoadPlugin(options)) return 1;

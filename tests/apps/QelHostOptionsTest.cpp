@@ -12,8 +12,10 @@ bool Parse(std::vector<std::string> args, QelHostOptions& options, std::string& 
 TEST(QelHostOptionsTest, DisplayChangesKeepTheirOrderAndTheModelFileIsTaken) {
   QelHostOptions options;
   std::string error;
-  ASSERT_TRUE(Parse({"--hide", "Datum A", "model.json", "--show", "Datum A", "--default-only"}, options, error));
+  ASSERT_TRUE(Parse({"--hide", "Datum A", "model.json", "--show", "Datum A", "--default-only", "--export-json", "out.json"},
+                    options, error));
   EXPECT_EQ(options.modelPath, "model.json");
+  EXPECT_EQ(options.exportJsonPath, "out.json") << "the export's file is not taken for the model";
   ASSERT_EQ(options.displayChanges.size(), 2u);
   EXPECT_FALSE(options.displayChanges[0].show);
   EXPECT_TRUE(options.displayChanges[1].show);
@@ -35,6 +37,8 @@ TEST(QelHostOptionsTest, RefusalsNameTheArgument) {
       {{"--hide", "x", ""}, "model file name '' is empty"},
       {{"--module", ""}, "'--module'"},
       {{"--tolerance", "t<nan"}, "'t<nan'"},
+      {{"--export-json"}, "'--export-json' needs a value"},
+      {{"--export-json", "", "model.stp"}, "'--export-json'"},
   };
   for (const auto& c : cases) {
     QelHostOptions options;

@@ -47,6 +47,8 @@ class QelLumAnnotationSet : public QelModelObject,
   bool IsLight() const { return light_; }
   int Kind() const { return kind_; }
   QelRootSetScope RootScope() const { return rootScope_; }
+  // The views component's second list as given to SetOtherElements; null: every capture.
+  const std::optional<std::vector<QelBaseUnknown_WR>>& OtherElements() const { return otherElements_; }
 
   const std::vector<QelVar<QelLumAnnotation>>& Annotations() const { return annotations_; }
   const std::vector<QelVar<QelLumView>>& Views() const { return views_; }

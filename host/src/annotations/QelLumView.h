@@ -40,6 +40,8 @@ class QelLumView : public QelModelObject,
   bool HasRelatedViews() const { return !related_.empty(); }
   const std::optional<QelMathPlane>& Plane() const { return plane_; }
   const std::vector<QelBaseUnknown_WR>& Elements() const { return elements_; }
+  const std::vector<QelBaseUnknown_WR>& ReferenceViews() const { return references_; }
+  const std::vector<QelBaseUnknown_WR>& RelatedViews() const { return related_; }
   void AddElement(QelBaseUnknown* element) { elements_.emplace_back(element); }
   void AddReferenceView(QelBaseUnknown* view) { references_.emplace_back(view); }
   void AddRelatedView(QelBaseUnknown* view) { related_.emplace_back(view); }

@@ -35,8 +35,44 @@ void OnlyKeys(const Json& o, const std::string& at, std::initializer_list<const 
   }
 }
 
+// A mesh written out in the file: vertices and triangles as index triples into them.
+QelMeshShape Triangles(const Json& body, const std::string& here) {
+  OnlyKeys(body, here, {"vertices", "faces"});
+  QelMeshShape mesh;
+  const Json* vertices = body.contains("vertices") ? &body["vertices"] : nullptr;
+  const Json* faces = body.contains("faces") ? &body["faces"] : nullptr;
+  if (!vertices || !vertices->is_array()) Refuse(here + ".vertices", "expected an array of [x, y, z]");
+  if (!faces || !faces->is_array()) Refuse(here + ".faces", "expected an array of [i, j, k]");
+  mesh.vertices.reserve(vertices->size());
+  for (size_t i = 0; i < vertices->size(); ++i) {
+    const std::string at = here + ".vertices[" + std::to_string(i) + "]";
+    const Json& v = (*vertices)[i];
+    if (!v.is_array() || v.size() != 3) Refuse(at, "expected an array of 3 numbers");
+    mesh.vertices.push_back({static_cast<float>(Number(v[0], at + "[0]")), static_cast<float>(Number(v[1], at + "[1]")),
+                             static_cast<float>(Number(v[2], at + "[2]"))});
+  }
+  mesh.triangles.reserve(faces->size());
+  for (size_t i = 0; i < faces->size(); ++i) {
+    const std::string at = here + ".faces[" + std::to_string(i) + "]";
+    const Json& f = (*faces)[i];
+    if (!f.is_array() || f.size() != 3) Refuse(at, "expected an array of 3 vertex indices");
+    std::array<uint32_t, 3> t{};
+    for (size_t k = 0; k < 3; ++k) {
+      if (!f[k].is_number_unsigned() || f[k].get<uint64_t>() >= mesh.vertices.size()) {
+        Refuse(at + "[" + std::to_string(k) + "]", "expected the index of one of the " +
+                                                       std::to_string(mesh.vertices.size()) + " vertices");
+      }
+      t[k] = static_cast<uint32_t>(f[k].get<uint64_t>());
+    }
+    mesh.triangles.push_back(t);
+  }
+  return mesh;
+}
+
 QelMeshShape Item(const Json& item, const std::string& at, const std::string& modelPath) {
-  if (!item.is_object() || item.size() != 1) Refuse(at, "expected an object with one of 'box', 'cylinder', 'mesh'");
+  if (!item.is_object() || item.size() != 1) {
+    Refuse(at, "expected an object with one of 'box', 'cylinder', 'mesh', 'triangles'");
+  }
   const std::string kind = item.begin().key();
   const Json& body = item.begin().value();
   const std::string here = at + "." + kind;
@@ -73,7 +109,8 @@ QelMeshShape Item(const Json& item, const std::string& at, const std::string& mo
     if (!QelMeshFileReader::Read(file.string(), mesh, reason)) Refuse(here + ".file", file.string() + ": " + reason);
     return mesh;
   }
-  Refuse(at, "unknown shape '" + kind + "' (expected 'box', 'cylinder' or 'mesh')");
+  if (kind == "triangles") return Triangles(body, here);
+  Refuse(at, "unknown shape '" + kind + "' (expected 'box', 'cylinder', 'mesh' or 'triangles')");
 }
 }  // namespace
 

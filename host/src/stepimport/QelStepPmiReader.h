@@ -1,0 +1,43 @@
+#pragma once
+// QelStepPmiReader: reads the semantic annotations (datums, geometric tolerances,
+// dimensions) and saved views of a translated document into a model under construction.
+// Lives for one import; it holds the document's tools and the builder by reference.
+#include <functional>
+#include <string>
+#include <unordered_map>
+#include <vector>
+
+#include <TDF_Label.hxx>
+#include <TDocStd_Document.hxx>
+
+#include "QelModelBuilder.h"
+#include "QelStepToleranceValues.h"
+
+class QelStepPmiReader {
+ public:
+  // `productOf`: the product made for a shape label (a part or assembly prototype), by the
+  // label's entry; `toleranceValues` is asked for magnitudes the translator left at 0.
+  QelStepPmiReader(const Handle(TDocStd_Document)& document, QelModelBuilder& builder,
+                   const std::unordered_map<std::string, QelBaseUnknown_var>& productOf,
+                   std::function<const QelStepToleranceValues&()> toleranceValues);
+
+  // Adds the sets, annotations, views and captures; `sceneCentre` and `sceneSize` place
+  // each capture's target in front of its camera. Adds lines to `notes` for what was left out.
+  void Read(const QelMathPoint& sceneCentre, double sceneSize, std::vector<std::string>& notes);
+
+  size_t AnnotationCount() const { return annotationCount_; }
+  size_t ViewCount() const { return viewCount_; }
+
+ private:
+  struct Pending;
+  std::string OwnerOf(const TDF_Label& label) const;
+  QelBaseUnknown_var SetFor(const std::string& owner);
+
+  Handle(TDocStd_Document) document_;
+  QelModelBuilder& builder_;
+  const std::unordered_map<std::string, QelBaseUnknown_var>& productOf_;
+  std::function<const QelStepToleranceValues&()> toleranceValues_;
+  std::unordered_map<std::string, QelBaseUnknown_var> sets_;  // owner entry ("" the root) -> set
+  size_t annotationCount_ = 0;
+  size_t viewCount_ = 0;
+};

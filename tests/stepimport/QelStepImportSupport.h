@@ -1,0 +1,38 @@
+#pragma once
+// What the STEP import tests share: the NIST models' paths, an import that must succeed,
+// and the model seen as the JSON model file it writes to (a tree the tests can search).
+#include <gtest/gtest.h>
+
+#include <sstream>
+#include <string>
+#include <vector>
+
+#include <nlohmann/json.hpp>
+
+#include "QelModelJsonWriter.h"
+#include "QelStepImporter.h"
+
+namespace QelStepTest {
+inline const std::string kCtc01 = std::string(QEL_NIST_MODELS) + "/nist_ctc_01_asme1_ap242-e1.stp";
+inline const std::string kFtc06 = std::string(QEL_NIST_MODELS) + "/nist_ftc_06_asme1_ap242-e2.stp";
+inline const std::string kStc06 = std::string(QEL_NIST_MODELS) + "/nist_stc_06_asme1_ap242-e3.stp";
+
+inline QelBaseUnknown_var Import(const std::string& path, std::vector<std::string>* notes = nullptr) {
+  QelBaseUnknown_var root;
+  std::string error;
+  std::vector<std::string> lines;
+  EXPECT_EQ(QelStepImporter::ImportFile(path, root, error, lines), S_OK) << error;
+  if (notes) *notes = lines;
+  return root;
+}
+
+inline nlohmann::json Dump(QelBaseUnknown* root) {
+  std::ostringstream out;
+  EXPECT_TRUE(QelModelJsonWriter::Write(root, out));
+  return nlohmann::json::parse(out.str());
+}
+}  // namespace QelStepTest
+
+#define QEL_REQUIRE_NIST_MODELS()                                                              \
+  if (!QelStepImporter::IsStepFile(QelStepTest::kCtc01)) GTEST_SKIP() << "no NIST models in " \
+                                                                      << QEL_NIST_MODELS

@@ -1,0 +1,174 @@
+// The importer on the three NIST annotation test models: what a reviewer must find in each
+// (datums, tolerance values, views and their cameras, shapes), and that the JSON model file
+// written from an import loads back to the same model.
+#include <cmath>
+#include <cstdio>
+#include <map>
+#include <set>
+
+#include "QelModelBuilder.h"
+#include "QelModelLoader.h"
+#include "QelRovFacetServices.h"
+#include "QelStepImportSupport.h"
+
+using namespace QelStepTest;
+using Json = nlohmann::json;
+
+namespace {
+std::vector<Json> WithCode(const Json& set, int code) {
+  std::vector<Json> out;
+  for (const Json& a : set["annotations"])
+    if (a["code"] == code) out.push_back(a);
+  return out;
+}
+
+const Json* ByAlias(const Json& list, const std::string& alias) {
+  for (const Json& item : list)
+    if (item["alias"] == alias) return &item;
+  return nullptr;
+}
+
+QelMathVector Vec(const Json& j) { return {j[0].get<double>(), j[1].get<double>(), j[2].get<double>()}; }
+
+QelMathVector Unit(const QelMathVector& v) { return v * (1.0 / v.Norm()); }
+
+void ExpectDirection(const QelMathVector& actual, const QelMathVector& expected, const std::string& what) {
+  EXPECT_LT((Unit(actual) - Unit(expected)).Norm(), 1e-5) << what;
+}
+
+size_t Triangles(const Json& product) {
+  size_t count = product.contains("shape") ? product["shape"]["triangles"]["faces"].size() : 0;
+  if (product.contains("children"))
+    for (const Json& child : product["children"]) count += Triangles(child);
+  return count;
+}
+}  // namespace
+
+TEST(QelStepImporterTest, Ctc01GivesDatumsTolerancesDimensionsAndItsView) {
+  QEL_REQUIRE_NIST_MODELS();
+  const int64_t before = QelBaseUnknown::LiveObjectCount();
+  {
+    std::vector<std::string> notes;
+    QelBaseUnknown_var root = Import(kCtc01, &notes);
+    ASSERT_TRUE(root);
+    EXPECT_TRUE(notes.empty()) << notes.front();
+    const Json model = Dump(root.get());
+    EXPECT_EQ(model["root"]["alias"], "NIST Complex Test Case 1");
+    EXPECT_GT(Triangles(model["root"]), 1000u) << "the part is tessellated";
+
+    ASSERT_EQ(model["sets"].size(), 1u) << "one product owns every annotation";
+    const Json& set = model["sets"][0];
+    EXPECT_FALSE(set["light"]);
+    EXPECT_EQ(set["owner"], model["root"]["children"][0]["id"]) << "the solid part owns the annotations";
+
+    // Each datum letter once, though every tolerance citing it repeats it in the file.
+    std::multiset<std::string> datums;
+    for (const Json& d : WithCode(set, 3)) {
+      datums.insert(d["names"][0].get<std::string>());
+      EXPECT_EQ(d["subType"], "Datum " + d["names"][0].get<std::string>());
+    }
+    EXPECT_EQ(datums, (std::multiset<std::string>{"A", "B", "C"}));
+
+    EXPECT_EQ(WithCode(set, 5).size(), 6u);
+    // The file writes this magnitude as a complex measure instance, which the translator drops.
+    const Json* position = ByAlias(set["annotations"], "Position.1");
+    ASSERT_TRUE(position);
+    EXPECT_EQ((*position)["type"], "Geometrical Tolerance");
+    EXPECT_EQ((*position)["subType"], "Position");
+    EXPECT_DOUBLE_EQ((*position)["tolerance"].get<double>(), 0.75);
+    const Json* flatness = ByAlias(set["annotations"], "Flatness.1");
+    ASSERT_TRUE(flatness);
+    EXPECT_DOUBLE_EQ((*flatness)["tolerance"].get<double>(), 0.2);
+
+    EXPECT_EQ(WithCode(set, 6).size(), 12u);
+    // 60 degrees +0.5/-0.5: the zone is 1; diameter 35 +0/-0.2: the zone is 0.2.
+    const Json* angle = ByAlias(set["annotations"], "angle 60");
+    ASSERT_TRUE(angle);
+    EXPECT_EQ((*angle)["subType"], "Angle");
+    EXPECT_NEAR((*angle)["tolerance"].get<double>(), 1.0, 1e-9);
+    const Json* diameter = ByAlias(set["annotations"], "diameter 25");
+    ASSERT_TRUE(diameter);
+    EXPECT_NEAR((*diameter)["tolerance"].get<double>(), 0.3, 1e-9);
+    const Json* distance = ByAlias(set["annotations"], "linear distance");
+    ASSERT_TRUE(distance);
+    EXPECT_EQ((*distance)["subType"], "Linear Distance");
+    EXPECT_TRUE((*distance)["tolerance"].is_null()) << "the file gives this dimension no tolerance";
+
+    ASSERT_EQ(set["views"].size(), 1u);
+    const Json& view = set["views"][0];
+    EXPECT_EQ(view["alias"], "MBD_0");
+    EXPECT_EQ(view["elements"].size(), 21u) << "the saved view lists all 21 annotations";
+    ASSERT_EQ(set["captures"].size(), 1u);
+    const Json& capture = set["captures"][0];
+    EXPECT_EQ(capture["view"], view["id"]);
+    const QelMathVector sight = Vec(capture["camera"]["target"]) - Vec(capture["camera"]["origin"]);
+    ExpectDirection(sight, {-0.588013, 0.566487, -0.57735}, "the capture looks along the file's view direction");
+    ExpectDirection(Vec(view["plane"]["normal"]), -sight, "the view plane faces the camera");
+    ExpectDirection(Vec(capture["camera"]["zenith"]), {-0.415788, 0.400567, 0.816497}, "the file's up direction");
+  }
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), before) << "the imported model leaked or left a cycle";
+}
+
+TEST(QelStepImporterTest, Ftc06HasThreeViewsEachCapturedWithTheFilesCamera) {
+  QEL_REQUIRE_NIST_MODELS();
+  QelBaseUnknown_var root = Import(kFtc06);
+  ASSERT_TRUE(root);
+  const Json model = Dump(root.get());
+  // Some datums name shapes of the second product (a compound): it gets a set of its own.
+  ASSERT_EQ(model["sets"].size(), 2u);
+  EXPECT_NE(model["sets"][0]["owner"], model["sets"][1]["owner"]);
+  const Json& set = model["sets"][0];
+  EXPECT_GT(WithCode(set, 5).size(), 10u);
+  const std::map<std::string, QelMathVector> directions = {{"MBD_A", {-0.57735, -0.57735, 0.57735}},
+                                                           {"MBD_B", {0.57735, -0.57735, -0.57735}},
+                                                           {"MBD_C", {0, -0.69797, 0.716127}}};
+  ASSERT_EQ(set["views"].size(), 3u);
+  ASSERT_EQ(set["captures"].size(), 3u);
+  for (const Json& capture : set["captures"]) {
+    const std::string name = capture["alias"].get<std::string>().substr(0, 5);
+    ASSERT_TRUE(directions.count(name)) << capture["alias"];
+    const Json* view = ByAlias(set["views"], name);
+    ASSERT_TRUE(view);
+    EXPECT_EQ(capture["view"], (*view)["id"]);
+    ExpectDirection(Vec(capture["camera"]["target"]) - Vec(capture["camera"]["origin"]), directions.at(name), name);
+  }
+}
+
+TEST(QelStepImporterTest, Stc06OpensWithItsAnnotationsAndNoView) {
+  QEL_REQUIRE_NIST_MODELS();
+  QelBaseUnknown_var root = Import(kStc06);
+  ASSERT_TRUE(root);
+  const Json model = Dump(root.get());
+  ASSERT_EQ(model["sets"].size(), 1u);
+  const Json& set = model["sets"][0];
+  EXPECT_EQ(set["rootSet"], "direct") << "the file's single part is the root, whose set is its own";
+  EXPECT_TRUE(set["views"].empty());
+  EXPECT_EQ(WithCode(set, 3).size(), 6u) << "datums A to F";
+  EXPECT_GT(WithCode(set, 5).size(), 20u);
+  EXPECT_GT(Triangles(model["root"]), 1000u);
+  // This file draws its annotations: their frames and leaders become drawing segments.
+  size_t drawn = 0;
+  for (const Json& a : set["annotations"]) drawn += a.contains("segments") ? 1 : 0;
+  EXPECT_GT(drawn, set["annotations"].size() / 2);
+}
+
+// The JSON model file of an import loads back to a model that writes out the same, so
+// every object, name, value, link, shape and shown state survived; a hidden annotation too.
+TEST(QelStepImporterTest, JsonExportOfCtc01LoadsBackToTheSameModel) {
+  QEL_REQUIRE_NIST_MODELS();
+  QelBaseUnknown_var root = Import(kCtc01);
+  ASSERT_TRUE(root);
+  QelListValQelBaseUnknown_var annotations;
+  QelRovFacetServices::ListAnnotationsOfVisibleSets(root.get(), annotations);
+  ASSERT_GT(annotations.Size(), 1);
+  ASSERT_TRUE(QelModelBuilder::SetShown(annotations[2], false));
+  Json model = Dump(root.get());
+  EXPECT_FALSE(model["sets"][0]["annotations"][1]["shown"]);
+  const std::string file = ::testing::TempDir() + "ctc01-export.json";
+  std::string error;
+  ASSERT_TRUE(QelModelJsonWriter::WriteFile(root.get(), file, error)) << error;
+  QelBaseUnknown_var reloaded;
+  ASSERT_EQ(QelModelLoader::LoadFile(file, reloaded, error), S_OK) << error;
+  EXPECT_EQ(Dump(reloaded.get()), model);
+  std::remove(file.c_str());
+}
