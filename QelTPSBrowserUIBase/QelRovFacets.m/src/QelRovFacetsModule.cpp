@@ -1,7 +1,14 @@
 // Load-time entry of the module. Registration of the module's classes runs here, once,
 // from the one initialiser below, in the order the host expects; entries for classes
 // still to come take their place in that order as they arrive.
+#include "QelDbrBrowserContextLFT.h"
 #include "QelDictionary.h"
+#include "QelERovBrowserContextFactory.h"
+#include "QelERovViewsBrowserViewBaseUI.h"
+#include "QelIDbrBrowserContext.h"
+#include "QelIDbrBrowserContextFactory.h"
+#include "QelIDbrBrowserViewBaseUI.h"
+#include "QelIVIABaseUI.h"
 #include "QelILumCapture.h"
 #include "QelILumGeometry.h"
 #include "QelILumLightLoadModeObservable.h"
@@ -25,6 +32,7 @@
 #include "QelRovFacetProperty.h"
 #include "QelRovFacetPropertyGroup.h"
 #include "QelRovFacetPropertyItem.h"
+#include "QelRovBrowsersFactories.h"
 #include "QelRovFacetsFactories.h"
 #include "QelRovRefinementFacetSYPIntro.h"
 #include "QelRovRefinementPropertySYPIntro.h"
@@ -42,6 +50,27 @@ void DescribeInterface(const char* name) {
 
 void QelRovFacetsRegister() {
   QelDictionary& dictionary = QelDictionary::Get();
+
+  // The views browser: the light context, the context factory on occurrences and DMU
+  // validations, the item adapter on light views and captures.
+  const char* lightContext = QelDbrBrowserContextLFT::MetaObject().Name();
+  dictionary.Register(lightContext, QelIDbrBrowserContext::IID,
+                      &CreateTIEQelIDbrBrowserContextQelDbrBrowserContextLFT, kFramework);
+  dictionary.Register(lightContext, QelILumLightLoadModeObserver::IID,
+                      &CreateTIEQelILumLightLoadModeObserverQelDbrBrowserContextLFT, kFramework);
+  const QelMetaObject& factory = QelERovBrowserContextFactory::MetaObject();
+  for (const std::string& lateType : factory.LateTypes())
+    dictionary.RegisterExtension(lateType, factory, &QelERovBrowserContextFactory::Create, kFramework);
+  dictionary.Register(factory.Name(), QelIDbrBrowserContextFactory::IID,
+                      &CreateBOAQelIDbrBrowserContextFactoryQelERovBrowserContextFactory, kFramework);
+  const QelMetaObject& itemUI = QelERovViewsBrowserViewBaseUI::MetaObject();
+  for (const std::string& lateType : itemUI.LateTypes())
+    dictionary.RegisterExtension(lateType, itemUI, &QelERovViewsBrowserViewBaseUI::Create, kFramework);
+  dictionary.Register(itemUI.Name(), QelIDbrBrowserViewBaseUI::IID,
+                      &CreateTIEQelIDbrBrowserViewBaseUIQelERovViewsBrowserViewBaseUI, kFramework);
+  dictionary.Register(itemUI.Name(), QelIVIABaseUI::IID, &CreateTIEQelIVIABaseUIQelERovViewsBrowserViewBaseUI,
+                      kFramework);
+
   QelRovFacet::MetaObject();
   QelRovFacetProperty::MetaObject();
   QelRovFacetPropertyItem::MetaObject();
