@@ -7,6 +7,7 @@
 #include <dlfcn.h>
 
 #include "QelDlgNotify.h"
+#include "QelHostBrowser.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
 #include "QelModelPrinter.h"
@@ -237,6 +238,8 @@ std::vector<QelHostCommand>& QelHostCommandTable() {
       {"widgets", "[json]", "print the panel's facet widgets as a person sees them (or as JSON)", &Widgets},
       {"thumbnail", "NAME FILE", "write the thumbnail of a view or capture as PNG (NAME \"*\": all, into a folder)", &Thumbnail},
       {"picture", "FILE", "write a picture of the whole model, as shown, as PNG", &Picture},
+      {"browser", "[thumbnails DIR]", "print the views browser, or write its thumbnails and an index.html into DIR", &QelHostBrowserCommand},
+      {"activate", "NAME", "activate a browser item: a capture's viewpoint and display are applied", &QelHostActivateCommand},
       {"help", "", "list the commands", &Help},
       {"quit", "", "end the session", &Quit},
   };
