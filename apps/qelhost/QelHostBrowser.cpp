@@ -1,5 +1,8 @@
 #include "QelHostBrowser.h"
 
+#include <algorithm>
+#include <cctype>
+#include <cstdio>
 #include <filesystem>
 #include <fstream>
 #include <ostream>
@@ -140,12 +143,15 @@ bool WriteThumbnails(QelHostSession& session, OpenBrowser& browser, const std::s
   int total = 0;
   for (const auto& node : browser->GetNodes()) total += node.items.Size();
   std::ostream& out = session.Out();
+  // The page is titled as the browser is (the catalog's title).
+  QelUnicodeString title;
+  if (QelVar<QelIDbrBrowserContext> context{browser->GetBrowserContext().get()}) context->GetBrowserTitle(title);
   std::string html =
-      "<!DOCTYPE html>\n<html><head><meta charset=\"utf-8\"><title>Views browser</title>\n"
+      "<!DOCTYPE html>\n<html><head><meta charset=\"utf-8\"><title>" + Html(title.Utf8()) + "</title>\n"
       "<style>body{font-family:sans-serif;margin:1em}section{margin-bottom:1.5em}"
       "figure{display:inline-block;margin:.5em;text-align:center;vertical-align:top}"
       "img{width:288px;height:216px;border:1px solid #888}figcaption{max-width:288px}"
-      ".description{color:#555}</style></head><body>\n<h1>Views browser</h1>\n";
+      ".description{color:#555}</style></head><body>\n<h1>" + Html(title.Utf8()) + "</h1>\n";
   int number = 0, failed = 0, skipped = 0;
   for (const auto& node : browser->GetNodes()) {
     html += "<section>\n<h2>" + Html(node.name.Str()) + "</h2>\n";

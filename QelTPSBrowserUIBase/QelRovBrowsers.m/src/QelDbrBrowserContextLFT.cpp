@@ -365,7 +365,7 @@ QelPathElement* QelDbrBrowserContextLFT::GetItemPath(QelBaseUnknown_var& item) {
     QelAssertPointer();
     return nullptr;
   }
-  QelVar<QelILumSet> set{QelBaseUnknown_var(owner.get()).get()};
+  QelVar<QelILumSet> set{owner.get()};
   owner = nullptr;
   if (!set) {
     QelAssertNullHandler();
