@@ -5,6 +5,7 @@
 #include <dlfcn.h>
 
 #include "QelDlgNotify.h"
+#include "QelHostBrowser.h"
 #include "QelHostPanelCommands.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
@@ -119,6 +120,8 @@ std::vector<QelHostCommand>& QelHostCommandTable() {
       {"light-load", "PRODUCT on|off", "switch a product's light-load mode", &QelHostPanelCommands::LightLoad},
       {"thumbnail", "NAME FILE", "write the thumbnail of a view or capture as PNG (NAME \"*\": all, into a folder)", &Thumbnail},
       {"picture", "FILE", "write a picture of the whole model, as shown, as PNG", &Picture},
+      {"browser", "[thumbnails DIR]", "print the views browser, or write its thumbnails and an index.html into DIR", &QelHostBrowserCommand},
+      {"activate", "NAME", "activate a browser item: a capture's viewpoint and display are applied", &QelHostActivateCommand},
       {"help", "", "list the commands", &Help},
       {"quit", "", "end the session", &Quit},
   };

@@ -1,42 +1,50 @@
 // Load-time entry of the module. Registration of the module's classes runs here, once,
 // from the one initialiser below, in the order the host expects; entries for classes
 // still to come take their place in that order as they arrive.
+#include "QelDbrBrowserContextLFT.h"
 #include "QelDelayedDestruction.h"
 #include "QelDictionary.h"
+#include "QelERovBrowserContextFactory.h"
+#include "QelERovViewsBrowserViewBaseUI.h"
+#include "QelIDbrBrowserContext.h"
+#include "QelIDbrBrowserContextFactory.h"
+#include "QelIDbrBrowserViewBaseUI.h"
 #include "QelIHyxFacetCtrl.h"
 #include "QelILumCapture.h"
 #include "QelILumGeometry.h"
 #include "QelILumLightLoadModeObservable.h"
+#include "QelILumLightLoadModeObserver.h"
 #include "QelILumSet.h"
+#include "QelInterfaceDescription.h"
+#include "QelIRovFacetPropertyObserver.h"
 #include "QelITPS.h"
 #include "QelITPSExtractionView.h"
 #include "QelITPSLight.h"
 #include "QelITPSLightSet.h"
 #include "QelITPSView.h"
-#include "QelInterfaceDescription.h"
-#include "QelILumLightLoadModeObserver.h"
-#include "QelIRovFacetPropertyObserver.h"
+#include "QelIVIABaseUI.h"
 #include "QelModuleVersion.h"
+#include "QelRovBrowsersFactories.h"
 #include "QelRovFacet.h"
 #include "QelRovFacetAnnotation.h"
 #include "QelRovFacetAnnotationSet.h"
 #include "QelRovFacetController.h"
-#include "QelRovFacetView.h"
 #include "QelRovFacetGroup.h"
 #include "QelRovFacetProperty.h"
 #include "QelRovFacetPropertyGroup.h"
 #include "QelRovFacetPropertyItem.h"
 #include "QelRovFacetsFactories.h"
+#include "QelRovFacetView.h"
+#include "QelRovRefinementDlgSYPIntro.h"
+#include "QelRovRefinementFacetSYPIntro.h"
+#include "QelRovRefinementPropertySYPIntro.h"
+#include "QelSYPMetaClassBuilder.h"
 
 // The controller answers QelIHyxFacetCtrl itself; it is only ever made by name.
 extern "C" QelBaseUnknown* CreateBOAQelIHyxFacetCtrlQelRovFacetController(QelBaseUnknown* impl) {
   if (impl) impl->AddRef();
   return impl;
 }
-#include "QelRovRefinementDlgSYPIntro.h"
-#include "QelRovRefinementFacetSYPIntro.h"
-#include "QelRovRefinementPropertySYPIntro.h"
-#include "QelSYPMetaClassBuilder.h"
 
 extern "C" const char* QelRovFacetsModuleName() { return "QelRovFacets"; }
 
@@ -50,6 +58,27 @@ void DescribeInterface(const char* name) {
 
 void QelRovFacetsRegister() {
   QelDictionary& dictionary = QelDictionary::Get();
+
+  // The views browser: the light context, the context factory on occurrences and DMU
+  // validations, the item adapter on light views and captures.
+  const char* lightContext = QelDbrBrowserContextLFT::MetaObject().Name();
+  dictionary.Register(lightContext, QelIDbrBrowserContext::IID,
+                      &CreateTIEQelIDbrBrowserContextQelDbrBrowserContextLFT, kFramework);
+  dictionary.Register(lightContext, QelILumLightLoadModeObserver::IID,
+                      &CreateTIEQelILumLightLoadModeObserverQelDbrBrowserContextLFT, kFramework);
+  const QelMetaObject& factory = QelERovBrowserContextFactory::MetaObject();
+  for (const std::string& lateType : factory.LateTypes())
+    dictionary.RegisterExtension(lateType, factory, &QelERovBrowserContextFactory::Create, kFramework);
+  dictionary.Register(factory.Name(), QelIDbrBrowserContextFactory::IID,
+                      &CreateBOAQelIDbrBrowserContextFactoryQelERovBrowserContextFactory, kFramework);
+  const QelMetaObject& itemUI = QelERovViewsBrowserViewBaseUI::MetaObject();
+  for (const std::string& lateType : itemUI.LateTypes())
+    dictionary.RegisterExtension(lateType, itemUI, &QelERovViewsBrowserViewBaseUI::Create, kFramework);
+  dictionary.Register(itemUI.Name(), QelIDbrBrowserViewBaseUI::IID,
+                      &CreateTIEQelIDbrBrowserViewBaseUIQelERovViewsBrowserViewBaseUI, kFramework);
+  dictionary.Register(itemUI.Name(), QelIVIABaseUI::IID, &CreateTIEQelIVIABaseUIQelERovViewsBrowserViewBaseUI,
+                      kFramework);
+
   QelRovFacet::MetaObject();
   QelRovFacetProperty::MetaObject();
   QelRovFacetPropertyItem::MetaObject();

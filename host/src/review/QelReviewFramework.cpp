@@ -2,6 +2,8 @@
 
 #include <memory>
 
+#include "QelCommandHeader.h"
+#include "QelDbrDisplayCaptureCommand.h"
 #include "QelDbrFilterAndClippingController.h"
 #include "QelDbrFilterComponent.h"
 #include "QelDictionary.h"
@@ -154,4 +156,5 @@ void QelReviewFramework::Register() {
   }
   d.Register("SorOccurrence", QelIBuildPath::IID, QelCreateTie<TieBuildPath>, kFramework);
   d.Register("QelLumAnnotation", QelIBuildPath::IID, QelCreateTie<TieBuildPath>, kFramework);
+  QelCommandHeader::Register(QelDbrDisplayCaptureCommand::kHeaderName, &QelDbrDisplayCaptureCommand::Run, kFramework);
 }
