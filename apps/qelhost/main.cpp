@@ -11,6 +11,7 @@
 #include <string>
 #include <vector>
 
+#include "QelAssert.h"
 #include "QelDictionary.h"
 #include "QelHostDemo.h"
 #include "QelHostModelFiles.h"
@@ -27,6 +28,20 @@
 #include "QelWidgetsPreview.h"
 
 namespace {
+// Internal check reports go to a log file beside the settings (or QEL_LOG_FILE), so a
+// person's terminal holds the review; at exit the person is told how many were written.
+struct SysLogNotice {
+  SysLogNotice() {
+    const std::string file = QelGetEnv("QEL_LOG_FILE");
+    QelSetSysLogFile(file.empty() ? QelSettingRepository::SettingsFolder() + "/qelhost.log" : file);
+  }
+  ~SysLogNotice() {
+    if (QelSysLogCount() > 0)
+      std::fprintf(stderr, "qelhost: %d internal check report(s) written to %s\n", QelSysLogCount(),
+                   QelSysLogFile().c_str());
+  }
+};
+
 constexpr const char* kModuleFramework = "QelTPSBrowserUIBase";
 
 // Prints or writes the requested user settings; false when one could not be done.
@@ -154,6 +169,7 @@ int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
 
 int main(int argc, char** argv) {
   if (QelWidgetsPreviewWanted(argc, argv)) return QelWidgetsPreviewMain(argc, argv);
+  const SysLogNotice logNotice;
   QelHostOptions options;
   std::string error;
   if (int code = 0; QelHostPictures::Run(std::vector<std::string>(argv + 1, argv + argc), options.modulePath,

@@ -3,6 +3,9 @@
 #include <gtest/gtest.h>
 
 #include <climits>
+#include <filesystem>
+#include <fstream>
+#include <sstream>
 #include <string>
 
 namespace {
@@ -54,6 +57,33 @@ TEST(QelAssertRoutine, OutsideDevelopmentLogsTheTextAndGoesOn) {
   const int line = __LINE__ - 1;
   std::string logged = testing::internal::GetCapturedStderr();
   EXPECT_EQ(logged, QelFormatAssertion(kQelAssertKindBool, "x", "QelAssertTest.cpp", line));
+}
+
+// A log file gets the reports appended (its folder made on the way); one that cannot be
+// written loses nothing: the report goes to standard error instead.
+TEST(QelAssertRoutine, LogFileCollectsReportsAndAnUnwritableOneFallsBackToStandardError) {
+  QelSetDevelopmentStage(false);
+  const std::filesystem::path dir = std::filesystem::path(testing::TempDir()) / "qel-assert-log";
+  std::filesystem::remove_all(dir);
+  const std::string path = (dir / "nested" / "host.log").string();
+  const int before = QelSysLogCount();
+  QelSetSysLogFile(path);
+  testing::internal::CaptureStderr();
+  QelAssertBool("first");
+  QelAssertBool("second");
+  EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
+  std::stringstream logged;
+  logged << std::ifstream(path).rdbuf();
+  EXPECT_NE(logged.str().find("first"), std::string::npos);
+  EXPECT_NE(logged.str().find("second"), std::string::npos);
+
+  QelSetSysLogFile(dir.string());  // a folder: cannot be opened as a file
+  testing::internal::CaptureStderr();
+  QelAssertBool("third");
+  EXPECT_NE(testing::internal::GetCapturedStderr().find("third"), std::string::npos);
+  QelSetSysLogFile("");
+  EXPECT_EQ(QelSysLogCount(), before + 3);
+  std::filesystem::remove_all(dir);
 }
 
 TEST(QelAssertRoutineDeathTest, DevelopmentRunAbortsWithTheTextPrintedOnce) {

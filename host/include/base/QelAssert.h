@@ -36,6 +36,12 @@ bool QelDevelopmentStage();
 void QelSetDevelopmentStage(bool on);
 
 void QelSysLogError(const char* text);
+// Where QelSysLogError writes: standard error (an empty path, the default) or the end of a
+// log file, its folder made when missing; a file that cannot be written falls back to
+// standard error. A program for people sends reports to a file and says how many it wrote.
+void QelSetSysLogFile(const std::string& path);
+const std::string& QelSysLogFile();
+int QelSysLogCount();
 [[noreturn]] void QelSysLogAbend(const char* text);
 
 struct QelAssertionReport {

@@ -3,11 +3,15 @@
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
+#include <filesystem>
+#include <system_error>
 #include <utility>
 
 namespace {
 int g_developmentStage = -1;  // -1: not decided yet, read from the environment
 QelAssertionCapture* g_capture = nullptr;
+std::string g_logFile;
+int g_logCount = 0;
 
 const char* BaseName(const char* path) {
   const char* slash = std::strrchr(path, '/');
@@ -44,9 +48,26 @@ bool QelDevelopmentStage() {
 void QelSetDevelopmentStage(bool on) { g_developmentStage = on ? 1 : 0; }
 
 void QelSysLogError(const char* text) {
+  ++g_logCount;
+  if (!g_logFile.empty()) {
+    std::FILE* file = std::fopen(g_logFile.c_str(), "a");
+    if (!file) {
+      std::error_code ignored;
+      std::filesystem::create_directories(std::filesystem::path(g_logFile).parent_path(), ignored);
+      file = std::fopen(g_logFile.c_str(), "a");
+    }
+    if (file) {
+      const bool written = std::fputs(text ? text : "", file) >= 0;
+      if (std::fclose(file) == 0 && written) return;
+    }
+  }
   std::fputs(text ? text : "", stderr);
   std::fflush(stderr);
 }
+
+void QelSetSysLogFile(const std::string& path) { g_logFile = path; }
+const std::string& QelSysLogFile() { return g_logFile; }
+int QelSysLogCount() { return g_logCount; }
 
 void QelSysLogAbend(const char* text) {
   std::fprintf(stderr, "qel: abnormal end: %s", text ? text : "");
