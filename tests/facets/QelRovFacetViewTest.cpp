@@ -1,5 +1,5 @@
 // The view facet: captures before views, the choice of all of them, what a later refresh
-// leaves checked, and an editor without a root.
+// leaves checked, an object whose set is lost, and an editor without a root.
 #include <gtest/gtest.h>
 
 #include "FacetModel.h"
@@ -69,6 +69,16 @@ TEST_F(ViewFacet, AllShowsEveryViewAndCaptureAndALaterRefreshChecksNeitherChoice
   EXPECT_EQ(At(kAll)->GetCheckState(), Unchecked);
   EXPECT_EQ(Custom()->GetCheckState(), Unchecked);
   EXPECT_EQ(QelSysDynamicCast<QelRovFacetProperty>(Custom()->GetPropertyList()[1].get())->GetCheckState(), Checked);
+}
+
+TEST_F(ViewFacet, AnObjectWhoseSetCannotBeFoundGivesNoItemAndOneAssertion) {
+  // C1 stays listed under set A but no longer leads back to it.
+  ASSERT_TRUE(QelModelBuilder::DetachFromSet(c1));
+  QelAssertionCapture capture;
+  facet->Refresh();
+  EXPECT_EQ(ChildLabels(Custom()), (std::vector<std::string>{"V1/Root/A", "V2/Root/B"}));
+  EXPECT_EQ(capture.Count(), 1);
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer, kQelAssertNullHandler), 1);
 }
 
 TEST_F(ViewFacet, WithoutRootAllAnswersSOkAndChangesNothing) {

@@ -2,6 +2,8 @@
 // the file, the style and the place, leaving the control without parts.
 #include <gtest/gtest.h>
 
+#include <cstdlib>
+
 #include "ProbeControl.h"
 #include "QelVidCtlButton.h"
 #include "QelVidLayGrid.h"
@@ -104,4 +106,41 @@ TEST(QelVidStyleSheet, RefusalsNameFileStyleAndPlaceAndLeaveTheControlWithoutPar
   folder.Write("good.sypstyle", kGoodSheet);
   EXPECT_EQ(probe->SetCustomStyle(QelString("good.sypstyle"), QelString("Main"), QelString("v")), E_FAIL);
   EXPECT_EQ(QelVidStyleSheet::TakeDiagnostics().size(), 2u);
+}
+
+// Sheets are kept per resource folder: once the folder setting changes, the same file
+// name is the new folder's sheet, and going back finds the first again. Two routes of one
+// template naming the same handler each reach it, and other routes stay their own.
+TEST(QelVidStyleSheet, TheSameFileNameInAnotherFolderIsThatFoldersSheet) {
+  const std::string twoButtons =
+      Replace(kGoodSheet, R"({"kind": "Grid")",
+              R"({"kind": "Button", "name": "Again", "on": {"Clicked": "OnPress"}}, {"kind": "Grid")");
+  StyleFolder first;
+  first.Write("probe.sypstyle", kGoodSheet);
+  StyleFolder second;  // the setting names this folder now
+  second.Write("probe.sypstyle", twoButtons);
+  auto styled = [] {
+    auto probe = QelMakeVar<ProbeControl>();
+    EXPECT_EQ(probe->SetCustomStyle(QelString("probe.sypstyle"), QelString("Main"), QelString("")), S_OK);
+    return probe;
+  };
+  EXPECT_NE(styled()->RetrieveSypNamedObject(QelString("Again")), nullptr);
+  ::setenv("QEL_RESOURCES_DIR", first.Path().c_str(), 1);
+  EXPECT_EQ(styled()->RetrieveSypNamedObject(QelString("Again")), nullptr);
+  ::setenv("QEL_RESOURCES_DIR", second.Path().c_str(), 1);
+
+  auto probe = styled();
+  auto* again = dynamic_cast<QelVidCtlButton*>(probe->RetrieveSypNamedObject(QelString("Again")));
+  auto* press = dynamic_cast<QelVidCtlButton*>(probe->RetrieveSypNamedObject(QelString("Press")));
+  ASSERT_NE(again, nullptr);
+  ASSERT_NE(press, nullptr);
+  probe->flag = 1;
+  probe->DispatchModifyProperty("Flag");
+  EXPECT_TRUE(again->Click());
+  EXPECT_TRUE(press->Click());
+  EXPECT_EQ(probe->presses, (std::vector<QelBaseUnknown*>{again, press}));
+  probe->RetrieveSypNamedObject(QelString("Body"))->MouseEnter();
+  EXPECT_EQ(probe->enters, 1);
+  EXPECT_EQ(probe->presses.size(), 2u);
+  EXPECT_TRUE(QelVidStyleSheet::TakeDiagnostics().empty());
 }

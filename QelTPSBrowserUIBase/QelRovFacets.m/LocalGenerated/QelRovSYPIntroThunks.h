@@ -7,33 +7,43 @@
 #include "QelSYPWRefMethEventHandler.h"
 #include "QelToolkitCheck.h"
 
+// The object as a T: through T::From where the class answers its own identity (no
+// dynamic_cast through the virtual base, for getters run per row), else a dynamic_cast.
+template <class T>
+T* QelRovSYPSelf(QelBaseUnknown* object) {
+  if constexpr (requires { T::From(object); })
+    return T::From(object);
+  else
+    return QelSysDynamicCast<T>(object);
+}
+
 template <class T, int (T::*Get)() const>
 int QelRovSYPGetInt(QelBaseUnknown* object) {
-  T* self = QelSysDynamicCast<T>(object);
+  T* self = QelRovSYPSelf<T>(object);
   return self ? (self->*Get)() : 0;
 }
 
 template <class T, void (T::*Set)(int)>
 void QelRovSYPSetInt(QelBaseUnknown* object, int value) {
-  if (T* self = QelSysDynamicCast<T>(object)) (self->*Set)(value);
+  if (T* self = QelRovSYPSelf<T>(object)) (self->*Set)(value);
 }
 
 template <class T, QelUnicodeString (T::*Get)() const>
 QelUnicodeString QelRovSYPGetText(QelBaseUnknown* object) {
-  T* self = QelSysDynamicCast<T>(object);
+  T* self = QelRovSYPSelf<T>(object);
   return self ? (self->*Get)() : QelUnicodeString();
 }
 
 template <class T, QelBaseUnknown* (T::*Get)() const>
 QelBaseUnknown* QelRovSYPGetBoxed(QelBaseUnknown* object) {
-  T* self = QelSysDynamicCast<T>(object);
+  T* self = QelRovSYPSelf<T>(object);
   return self ? (self->*Get)() : nullptr;
 }
 
 template <class T, void (T::*Member)(QelBaseUnknown*, QelSYPEventArgs*)>
 QelSYPEventHandler* QelRovSYPMakeHandler(QelBaseUnknown* i_pObj) {
   if (!QelTkCheckPointer(i_pObj, "i_pObj")) return nullptr;
-  T* pObj = QelSysDynamicCast<T>(i_pObj);
+  T* pObj = QelRovSYPSelf<T>(i_pObj);
   if (!QelTkCheckPointer(pObj, "pObj")) return nullptr;
   return new QelSYPWRefMethEventHandler<T>(pObj, Member);
 }

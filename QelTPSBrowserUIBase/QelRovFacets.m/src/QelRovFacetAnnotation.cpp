@@ -296,6 +296,10 @@ HRESULT QelRovFacetAnnotation::BuildKindRows(QelBaseUnknown* root, QelRovFacetFi
   if (!listed) QelRovFacetServices::ListAnnotationsOfVisibleSets(root, own);
   const QelListValQelBaseUnknown_var& annotations = listed ? *listed : own;
   if (annotations.Size() == 0) return S_OK;
+  // Resolved once: the annotations of a pass land in these seven groups.
+  QelRovFacetPropertyGroup* kindGroups[KindCount + 1] = {};
+  for (int kindIndex = 1; kindIndex <= KindCount; ++kindIndex)
+    kindGroups[kindIndex] = QelSysDynamicCast<QelRovFacetPropertyGroup>(kinds[kindIndex].get());
   QelVar<QelITPSTypeClassifier> classifier;
   for (int position = 1; position <= annotations.Size(); ++position) {
     const QelBaseUnknown_var& annotation = annotations[position];
@@ -327,7 +331,7 @@ HRESULT QelRovFacetAnnotation::BuildKindRows(QelBaseUnknown* root, QelRovFacetFi
       QelAssertBool("annotation type code of a kind");
       continue;
     }
-    auto* kind = QelSysDynamicCast<QelRovFacetPropertyGroup>(kinds[kindIndex].get());
+    QelRovFacetPropertyGroup* kind = kindGroups[kindIndex];
     if (!kind) {
       QelAssertPointer("QelRovFacetPropertyGroup");
       continue;

@@ -19,6 +19,10 @@ QelRovFacetProperty::QelRovFacetProperty(const QelUnicodeString& name, const Qel
 
 QelRovFacetProperty::~QelRovFacetProperty() = default;
 
+void* QelRovFacetProperty::QueryDirect(const QelIID& iid) {
+  return iid == ClassIID ? this : QelBaseUnknown::QueryDirect(iid);
+}
+
 HRESULT QelRovFacetProperty::GetChildren(QelListValQelBaseUnknown_var&) { return E_NOTIMPL; }
 
 HRESULT QelRovFacetProperty::UpdateName() { return S_OK; }

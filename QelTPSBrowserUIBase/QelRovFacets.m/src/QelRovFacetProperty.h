@@ -4,6 +4,7 @@
 // facet's list or by its group's children and holds its owner (facet or group) weakly;
 // every change is told to that owner through QelIRovFacetPropertyObserver.
 #include <cstdint>
+#include <utility>
 
 #include "QelBaseUnknown_WR.h"
 #include "QelIRovFacetPropertyObserver.h"
@@ -25,6 +26,17 @@ class QelRovFacetProperty : public virtual QelBaseUnknown {
   static constexpr int32_t FlagsCheckBoxRange = 0xA14;
   // The range operations need one of the range mode's two low bits.
   static constexpr int32_t RangeModeMask = 3;
+
+  // Answered by every property's own QueryDirect, so that groups walking their children
+  // reach the property behind a handle without a dynamic_cast through the virtual base.
+  // A subclass overriding QueryDirect must defer to this class's.
+  static constexpr QelIID ClassIID = QelIID::Parse("{3B7D52C4-0E8A-4F61-A2D9-71C5E48B0F36}");
+  // The property behind `object` (a tie resolves to its implementation), borrowed; null
+  // for null or for an object that is no property.
+  static QelRovFacetProperty* From(QelBaseUnknown* object) {
+    QelBaseUnknown* impl = object ? object->GetImpl() : nullptr;
+    return impl ? static_cast<QelRovFacetProperty*>(impl->FindOwnInterface(ClassIID)) : nullptr;
+  }
 
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override;
@@ -75,9 +87,10 @@ class QelRovFacetProperty : public virtual QelBaseUnknown {
  protected:
   QelRovFacetProperty(const QelUnicodeString& name, const QelUnicodeString& iconName, QelBaseUnknown* owner);
   ~QelRovFacetProperty() override;
+  void* QueryDirect(const QelIID& iid) override;
 
-  void SetName(const QelUnicodeString& name) { name_ = name; }
-  void SetIconName(const QelUnicodeString& iconName) { iconName_ = iconName; }
+  void SetName(QelUnicodeString name) { name_ = std::move(name); }
+  void SetIconName(QelUnicodeString iconName) { iconName_ = std::move(iconName); }
 
   // Resolves the owner's observer interface, reporting a null handler when it has none.
   QelVar<QelIRovFacetPropertyObserver> ResolveOwnerObserver() const;

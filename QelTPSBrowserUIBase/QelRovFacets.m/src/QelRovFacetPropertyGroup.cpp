@@ -62,7 +62,7 @@ QelRovFacetProperty* QelRovFacetPropertyGroup::ChildAt(int position) const {
     QelAssertNullHandler();
     return nullptr;
   }
-  QelRovFacetProperty* child = QelSysDynamicCast<QelRovFacetProperty>(entry);
+  QelRovFacetProperty* child = QelRovFacetProperty::From(entry);
   if (!child) QelAssertPointer("QelRovFacetProperty");
   return child;
 }

@@ -47,7 +47,9 @@ bool QelRovFacetPropertyItem::SetIconFrom(QelBaseUnknown* source) {
   if (!icon) return false;
   QelUnicodeString name;
   icon->GetIconName(name);
-  SetIconName(IconPrefix + name);
+  QelUnicodeString prefixed = IconPrefix;
+  prefixed += name;
+  SetIconName(std::move(prefixed));
   return true;
 }
 

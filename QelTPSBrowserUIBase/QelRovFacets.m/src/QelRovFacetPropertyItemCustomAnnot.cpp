@@ -40,7 +40,7 @@ QelRovFacetPropertyItemCustomAnnot::QelRovFacetPropertyItemCustomAnnot(QelBaseUn
     }
     alias->GetAlias(label);
   }
-  SetName(label);
+  SetName(std::move(label));
   if (!SetIconFrom(annotation)) QelAssertNullHandler();
 }
 

@@ -63,6 +63,10 @@ QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, const Q
 
 QelRovRefinementProperty::~QelRovRefinementProperty() = default;
 
+void* QelRovRefinementProperty::QueryDirect(const QelIID& iid) {
+  return iid == ClassIID ? this : QelVidCtl::QueryDirect(iid);
+}
+
 QelString QelRovRefinementProperty::GetResourceFilename(int level) const {
   if (level <= 0) return QelString("QelRovRefinementProperty");
   return QelVidCtl::GetResourceFilename(level - 1);
@@ -74,7 +78,7 @@ QelRovFacetProperty* QelRovRefinementProperty::ResolveProperty(QelBaseUnknown_va
     QelAssertNullHandler();
     return nullptr;
   }
-  auto* property = QelSysDynamicCast<QelRovFacetProperty>(hold.get());
+  QelRovFacetProperty* property = QelRovFacetProperty::From(hold.get());
   if (!property) QelAssertPointer();
   return property;
 }

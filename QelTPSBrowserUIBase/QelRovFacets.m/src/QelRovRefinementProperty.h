@@ -17,6 +17,14 @@ class QelRovRefinementProperty : public QelVidCtl {
  public:
   enum Kind : int { KindNone = -1, KindSingleElement = 0, KindExpander = 1, KindRange = 2 };
 
+  // Answered by the row's own QueryDirect: its introspection getters, run for every
+  // binding of every row, reach the row without a dynamic_cast.
+  static constexpr QelIID ClassIID = QelIID::Parse("{9D2E6B71-4A0F-4C83-B5E1-2F7A90C3D648}");
+  static QelRovRefinementProperty* From(QelBaseUnknown* object) {
+    QelBaseUnknown* impl = object ? object->GetImpl() : nullptr;
+    return impl ? static_cast<QelRovRefinementProperty*>(impl->FindOwnInterface(ClassIID)) : nullptr;
+  }
+
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override;
 
@@ -73,6 +81,7 @@ class QelRovRefinementProperty : public QelVidCtl {
   QelVidLayGrid* GetGrid() const { return grid_; }
 
  protected:
+  void* QueryDirect(const QelIID& iid) override;
   ~QelRovRefinementProperty() override;
   void OnTemplateApplied() override;
 

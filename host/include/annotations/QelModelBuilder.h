@@ -129,6 +129,11 @@ class QelModelBuilder {
   // Gives a product of this model (the root too) its shape; false for anything else.
   bool SetShape(const QelBaseUnknown_var& product, std::shared_ptr<const QelMeshShape> shape);
 
+  // Cuts a view's or capture's link to its set while the set still lists it: the object's
+  // set can no longer be found, as in a host whose record of it was lost. False for
+  // anything else.
+  static bool DetachFromSet(const QelBaseUnknown_var& viewOrCapture);
+
   // Shown/hidden state of any model object, outside the facet services.
   static bool SetShown(const QelBaseUnknown_var& object, bool shown);
   // Switches a set owner's light-load mode; observers are told when it changes.

@@ -35,6 +35,10 @@ class QelDictionary {
   void RemoveFramework(std::string_view framework);
 
   QelFactory FindFactory(std::string_view classOrLateType, const QelIID& iid) const;
+  // Whether any factory is registered for `iid`: when none is, no tie or extension can
+  // answer it, and a query that the object itself refused ends without walking the
+  // dictionary for each class of the object.
+  bool HasFactoryFor(const QelIID& iid) const;
   QelNamedCreator FindNamedCreator(std::string_view name) const;
 
   struct ExtensionEntry {
@@ -64,6 +68,8 @@ class QelDictionary {
     std::string framework;
   };
   std::vector<FactoryEntry> factories_;
+  std::vector<QelIID> interfaces_;  // distinct identifiers of factories_
+  void IndexInterfaces();
   std::vector<ExtensionEntry> extensions_;
   std::vector<NamedEntry> named_;
 };

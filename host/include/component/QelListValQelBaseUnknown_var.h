@@ -23,6 +23,8 @@ class QelListValQelBaseUnknown_var {
   // Keeps the first of equal entries, in order.
   void RemoveDuplicates();
   void RemoveAll() { items_.clear(); }
+  // Room for `count` entries in all, so a long listing grows its storage once.
+  void Reserve(int count) { if (count > 0) items_.reserve(static_cast<size_t>(count)); }
 
   auto begin() const { return items_.begin(); }
   auto end() const { return items_.end(); }

@@ -5,6 +5,7 @@
 // builder (QelSYPMetaClassBuilder), then kept until the framework that built it unloads.
 #include <memory>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "QelSYPValue.h"
@@ -73,7 +74,7 @@ class QelSYPMetaClass {
 
   // The class, registered by its own builder on first use; null when no builder is
   // registered under "<className>SYPMetaClassBuilder" and the class is not the toolkit's.
-  static const QelSYPMetaClass* Find(const std::string& className);
+  static const QelSYPMetaClass* Find(std::string_view className);
   // Forgets the classes a framework built (its getters would dangle once it unloads).
   static void RemoveFramework(const std::string& framework);
   // Keeps a table made by a builder, replacing one of the same class name.

@@ -33,6 +33,7 @@ class QelVidCtl : public QelVidWidget {
 
   // Used by the style sheet while it instantiates a template.
   void SetTemplateRoot(QelVidWidget* root);
+  void ReserveTemplate(size_t namedParts, size_t bindings);
   void AddNamedPart(const std::string& name, QelVidWidget* part);
   void AddBinding(QelVidWidget* part, const std::string& attribute, const QelSYPMetaClass::Property* property);
   struct Binding {

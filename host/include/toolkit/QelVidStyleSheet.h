@@ -39,6 +39,7 @@ class QelVidStyleSheet {
 
  private:
   QelVidStyleSheet(std::string path, std::unique_ptr<Document> document);
+  static const QelVidStyleSheet* LoadByPath(const std::string& fileName, const std::string& forStyle);
   std::string path_;
   std::unique_ptr<Document> document_;
 };

@@ -104,6 +104,8 @@ class QelVidWidget : public QelISYPIntrospectable {
 
   QelString name_;
   QelBaseUnknown_WR parent_;
+  // The widget parent_ refers to, valid while parent_ resolves: spares a cast per look-up.
+  QelVidWidget* parentWidget_ = nullptr;
   std::vector<QelVar<QelVidWidget>> children_;
   // A few per widget: a flat list is cheaper to build than a tree.
   Attributes attributes_;

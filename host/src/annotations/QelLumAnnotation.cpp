@@ -28,6 +28,7 @@ QelLumAnnotation::QelLumAnnotation(QelLumAnnotationSet* set, const QelModelAnnot
 QelLumAnnotation::~QelLumAnnotation() = default;
 
 void* QelLumAnnotation::QueryDirect(const QelIID& iid) {
+  if (iid == ClassIID) return this;
   // Which kind of annotation this is decides the interfaces it answers.
   if (iid == QelITPS::IID) return geometry_ ? nullptr : static_cast<QelITPS*>(this);
   if (iid == QelILumGeometry::IID) return geometry_ ? static_cast<QelILumGeometry*>(this) : nullptr;

@@ -29,6 +29,14 @@ class QelLumAnnotation : public QelModelObject,
  public:
   QelLumAnnotation(QelLumAnnotationSet* set, const QelModelAnnotationDesc& desc);
 
+  // Answered by the annotation's own QueryDirect: the classifier reaches the annotation
+  // behind a handle without a dynamic_cast, once per annotation of a pass.
+  static constexpr QelIID ClassIID = QelIID::Parse("{C81F3A5E-62D4-4B97-9E0C-5A2F7B18D463}");
+  static QelLumAnnotation* From(QelBaseUnknown* object) {
+    QelBaseUnknown* impl = object ? object->GetImpl() : nullptr;
+    return impl ? static_cast<QelLumAnnotation*>(impl->FindOwnInterface(ClassIID)) : nullptr;
+  }
+
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override;
 

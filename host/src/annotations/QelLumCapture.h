@@ -20,6 +20,8 @@ class QelLumCapture : public QelModelObject, public QelILumCapture, public QelIS
   const char* GetLateType() const override;
 
   HRESULT GetSet(QelBaseUnknown_var& set) override;
+  // Leaves the object listed under its set without a link back to it.
+  void DetachSet() { set_.Reset(); }
   HRESULT IsLinkedToView(bool& linked) override;
   HRESULT GetLinkedView(QelBaseUnknown_var& view) override;
   HRESULT GetCamera(QelVar<QelICamera>& camera) override;

@@ -20,21 +20,21 @@ void* QelLumNamingComponent::QueryDirect(const QelIID& iid) {
 }
 
 HRESULT QelLumNamingComponent::GetTypeCodeName(QelBaseUnknown* annotation, QelString& codeName) {
-  auto* found = QelSysDynamicCast<QelLumAnnotation>(annotation);
+  QelLumAnnotation* found = QelLumAnnotation::From(annotation);
   if (!found) return E_FAIL;
   codeName = QelString("TypeCode" + std::to_string(found->TypeCode()));
   return S_OK;
 }
 
 HRESULT QelLumNamingComponent::GetSubTypeName(QelBaseUnknown* annotation, QelUnicodeString& name) {
-  auto* found = QelSysDynamicCast<QelLumAnnotation>(annotation);
+  QelLumAnnotation* found = QelLumAnnotation::From(annotation);
   if (!found) return E_FAIL;
   name = QelUnicodeString(found->SubTypeName());
   return S_OK;
 }
 
 HRESULT QelLumNamingComponent::GetTypeName(QelBaseUnknown* annotation, QelUnicodeString& name) {
-  auto* found = QelSysDynamicCast<QelLumAnnotation>(annotation);
+  QelLumAnnotation* found = QelLumAnnotation::From(annotation);
   if (!found) return E_FAIL;
   name = QelUnicodeString(found->TypeName());
   return S_OK;

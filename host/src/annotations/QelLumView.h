@@ -29,6 +29,8 @@ class QelLumView : public QelModelObject,
   const char* GetLateType() const override;
 
   HRESULT GetSet(QelBaseUnknown_var& set) override;
+  // Leaves the object listed under its set without a link back to it.
+  void DetachSet() { set_.Reset(); }
   HRESULT GetPlane(QelMathPlane*& plane) override;
   HRESULT GetElements(QelVar<QelILumCollection>& elements) override;
   HRESULT GetReferenceViews(QelVar<QelILumCollection>& views) override;

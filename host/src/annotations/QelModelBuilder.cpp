@@ -155,6 +155,18 @@ QelBaseUnknown_var QelModelBuilder::Finish() {
   return root;
 }
 
+bool QelModelBuilder::DetachFromSet(const QelBaseUnknown_var& viewOrCapture) {
+  if (auto* view = QelSysDynamicCast<QelLumView>(viewOrCapture.get())) {
+    view->DetachSet();
+    return true;
+  }
+  if (auto* capture = QelSysDynamicCast<QelLumCapture>(viewOrCapture.get())) {
+    capture->DetachSet();
+    return true;
+  }
+  return false;
+}
+
 bool QelModelBuilder::SetShown(const QelBaseUnknown_var& object, bool shown) {
   auto* target = QelSysDynamicCast<QelModelObject>(object.get());
   if (!target) return false;

@@ -84,6 +84,10 @@ HRESULT QelRovFacetServices::ListARMOrDirectSets(QelBaseUnknown* root, QelListVa
 HRESULT QelRovFacetServices::ListAnnotationsOfVisibleSets(QelBaseUnknown* root, QelListValQelBaseUnknown_var& list) {
   QelAnnotationModel* model = QelAnnotationModel::Of(root);
   if (!model) return E_FAIL;
+  size_t count = static_cast<size_t>(list.Size());
+  for (const auto& set : model->Sets())
+    if (set->IsShown()) count += set->Annotations().size();
+  list.Reserve(static_cast<int>(count));
   for (const auto& set : model->Sets()) {
     if (!set->IsShown()) continue;
     for (const auto& annotation : set->Annotations()) list.Append(static_cast<QelITPS*>(annotation.get()));

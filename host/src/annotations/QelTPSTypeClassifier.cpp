@@ -30,7 +30,7 @@ HRESULT QelTPSTypeClassifier::IsKnownTypeCode(int code, bool& known) {
 
 HRESULT QelTPSTypeClassifier::GetType(QelBaseUnknown* annotation, QelBaseUnknown_var& type) {
   type = nullptr;
-  auto* found = QelSysDynamicCast<QelLumAnnotation>(annotation);
+  QelLumAnnotation* found = QelLumAnnotation::From(annotation);
   if (!found) return E_FAIL;
   type = QelBaseUnknown_var::Adopt(new QelTPSAnnotationType(found));
   return S_OK;

@@ -144,6 +144,7 @@ HRESULT QelBaseUnknown::QueryInterface(const QelIID& iid, void** out) {
     return S_OK;
   }
   const QelDictionary& dictionary = QelDictionary::Get();
+  if (!dictionary.HasFactoryFor(iid)) return E_NOINTERFACE;
   // Answer with the factory (tie or direct) from the dictionary: first the ties of the
   // object's class and its ancestors, then the data extensions of its late type.
   auto answerWith = [&](QelFactory factory, QelBaseUnknown* impl) -> HRESULT {

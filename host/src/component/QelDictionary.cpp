@@ -20,6 +20,17 @@ void QelDictionary::Register(std::string_view classOrLateType, const QelIID& iid
     }
   }
   factories_.push_back({std::string(classOrLateType), iid, factory, std::string(framework)});
+  if (!HasFactoryFor(iid)) interfaces_.push_back(iid);
+}
+
+bool QelDictionary::HasFactoryFor(const QelIID& iid) const {
+  return std::find(interfaces_.begin(), interfaces_.end(), iid) != interfaces_.end();
+}
+
+void QelDictionary::IndexInterfaces() {
+  interfaces_.clear();
+  for (const auto& entry : factories_)
+    if (!HasFactoryFor(entry.iid)) interfaces_.push_back(entry.iid);
 }
 
 void QelDictionary::RegisterExtension(std::string_view lateType, const QelMetaObject& extension,
@@ -48,6 +59,7 @@ void QelDictionary::RegisterNamedCreator(std::string_view name, QelNamedCreator 
 void QelDictionary::RemoveFramework(std::string_view framework) {
   auto of = [&](const auto& entry) { return entry.framework == framework; };
   std::erase_if(factories_, of);
+  IndexInterfaces();
   std::erase_if(extensions_, of);
   std::erase_if(named_, of);
 }

@@ -10,14 +10,16 @@
 #include "QelVidStyleSheet.h"
 
 namespace {
-std::map<std::string, std::unique_ptr<QelSYPMetaClass>>& Registry() {
+// Transparent, so a look-up by a class name needs no string of its own.
+using RegistryMap = std::map<std::string, std::unique_ptr<QelSYPMetaClass>, std::less<>>;
+RegistryMap& Registry() {
   // Never destroyed: a module's unloader may still remove its classes during exit.
-  static auto* registry = new std::map<std::string, std::unique_ptr<QelSYPMetaClass>>();
+  static auto* registry = new RegistryMap();
   return *registry;
 }
 
 // The toolkit's own classes have no properties of their own but are bases of others.
-const QelSYPMetaClass* ToolkitClass(const std::string& name) {
+const QelSYPMetaClass* ToolkitClass(std::string_view name) {
   static const QelSYPMetaClass widget("QelVidWidget", "toolkit", {}, {}, nullptr, nullptr);
   static const QelSYPMetaClass control("QelVidCtl", "toolkit", {}, {}, nullptr, &widget);
   if (name == "QelVidWidget") return &widget;
@@ -42,10 +44,11 @@ QelSYPMetaClass::QelSYPMetaClass(std::string className, std::string framework, s
       create_(create),
       base_(base) {}
 
-const QelSYPMetaClass* QelSYPMetaClass::Find(const std::string& className) {
-  if (const QelSYPMetaClass* own = ToolkitClass(className)) return own;
+const QelSYPMetaClass* QelSYPMetaClass::Find(std::string_view name) {
+  if (const QelSYPMetaClass* own = ToolkitClass(name)) return own;
   auto& registry = Registry();
-  if (auto it = registry.find(className); it != registry.end()) return it->second.get();
+  if (auto it = registry.find(name); it != registry.end()) return it->second.get();
+  const std::string className(name);
   const std::string builderName = className + "SYPMetaClassBuilder";
   QelSYPMetaClassBuilder::Creator creator = QelSYPMetaClassBuilder::FindCreator(builderName);
   if (!creator || Building()[className]) return nullptr;

@@ -55,6 +55,11 @@ void QelVidCtl::SetTemplateRoot(QelVidWidget* root) {
   AddChild(root);
 }
 
+void QelVidCtl::ReserveTemplate(size_t namedParts, size_t bindings) {
+  parts_.reserve(parts_.size() + namedParts);
+  bindings_.reserve(bindings_.size() + bindings);
+}
+
 void QelVidCtl::AddNamedPart(const std::string& name, QelVidWidget* part) {
   if (parts_.empty()) parts_.reserve(8);
   if (part) parts_.emplace_back(name, QelVar<QelVidWidget>::Retain(part));

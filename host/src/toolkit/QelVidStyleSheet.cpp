@@ -1,10 +1,12 @@
 #include "QelVidStyleSheet.h"
 
+#include <cstdlib>
 #include <fstream>
 #include <map>
 #include <optional>
 #include <nlohmann/json.hpp>
 #include <sstream>
+#include <string_view>
 
 #include "QelAssert.h"
 #include "QelMsgCatalog.h"
@@ -28,11 +30,17 @@
 
 using nlohmann::json;
 
+namespace {
+constexpr const char* kResourcesVariable = "QEL_RESOURCES_DIR";
+}
+
 // A style's template checked against one control class and kept, so that building the
 // thousandth row costs only its widgets: kinds, names, attribute values, resolved
 // properties and handlers, cells.
 struct QelVidCompiledPart {
+  using Maker = QelVar<QelVidWidget> (*)(const QelString& name);
   std::string kind;
+  Maker make = nullptr;  // resolved from the kind once
   QelString name;
   std::vector<std::pair<std::string, QelSYPValue>> attributes;
   struct Binding {
@@ -43,18 +51,36 @@ struct QelVidCompiledPart {
   struct Route {
     QelSYPEvent* event;
     std::string handler;
+    size_t slot;  // among the template's distinct handler names, so one handler serves them all
   };
   std::vector<Route> routes;
   std::vector<QelVidCompiledPart> children;
   std::vector<std::optional<QelVidGridConstraints>> cells;  // for a Grid's children
   std::unique_ptr<QelVidCompiledPart> header;
   std::unique_ptr<QelVidCompiledPart> body;
+  // Whole-template totals, kept on the root only: a control reserves for them once.
+  size_t handlerSlots = 0;
+  size_t namedParts = 0;
+  size_t bindingCount = 0;
+};
+
+// Orders (style, class) keys and lets a look-up use the style name as it comes, without
+// a key string of its own.
+struct QelVidCompiledKeyLess {
+  using is_transparent = void;
+  template <class A, class B>
+  bool operator()(const A& a, const B& b) const {
+    const int order = std::string_view(a.first).compare(std::string_view(b.first));
+    return order < 0 || (order == 0 && std::less<>()(a.second, b.second));
+  }
 };
 
 struct QelVidStyleSheet::Document {
   json root;
   // Per style and control class; only templates that passed every check are kept.
-  std::map<std::pair<std::string, const QelSYPMetaClass*>, std::shared_ptr<const QelVidCompiledPart>> compiled;
+  std::map<std::pair<std::string, const QelSYPMetaClass*>, std::shared_ptr<const QelVidCompiledPart>,
+           QelVidCompiledKeyLess>
+      compiled;
 };
 
 namespace {
@@ -62,6 +88,17 @@ std::map<std::string, std::unique_ptr<QelVidStyleSheet>>& Cache() {
   // Never destroyed: a module's unloader still clears it during exit.
   static auto* cache = new std::map<std::string, std::unique_ptr<QelVidStyleSheet>>();
   return *cache;
+}
+// The sheets last handed out, by the resource folder setting and file name they were
+// asked under: a control styled per row finds its sheet without building its path.
+struct RecentSheet {
+  std::string resourcesSetting;
+  std::string fileName;
+  const QelVidStyleSheet* sheet;
+};
+std::vector<RecentSheet>& Recent() {
+  static auto* recent = new std::vector<RecentSheet>();
+  return *recent;
 }
 std::vector<std::string>& Diagnostics() {
   static auto* diagnostics = new std::vector<std::string>();
@@ -87,17 +124,24 @@ std::string LineAndColumn(const std::string& text, size_t offset) {
   return "line " + std::to_string(line) + ", column " + std::to_string(column);
 }
 
-QelVar<QelVidWidget> MakePart(const std::string& kind, const QelString& name) {
-  if (kind == "Frame") return QelMakeVar<QelVidCtlFrame>(nullptr, name);
-  if (kind == "Label") return QelMakeVar<QelVidLabel>(nullptr, name);
-  if (kind == "Grid") return QelMakeVar<QelVidLayGrid>(nullptr, name);
-  if (kind == "Spacer") return QelMakeVar<QelVidSpacer>(nullptr, name);
-  if (kind == "Expander") return QelMakeVar<QelVidCtlExpander>(nullptr, name);
-  if (kind == "Button") return QelMakeVar<QelVidCtlButton>(nullptr, name);
-  if (kind == "CheckButton") return QelMakeVar<QelVidCtlCheckButton>(nullptr, name);
-  if (kind == "ScrollableArea") return QelMakeVar<QelVidCtlScrollableArea>(nullptr, name);
-  if (kind == "Combo") return QelMakeVar<QelVidCtlImageAndLabelCombo>(nullptr, name);
-  if (kind == "LineEditor") return QelMakeVar<QelVidCtlLineEditor>(nullptr, name);
+// The new part's reference, taken over as a widget handle: the upcast is static, where a
+// handle conversion would cast dynamically.
+template <class Kind>
+QelVar<QelVidWidget> NewPart(const QelString& name) {
+  return QelVar<QelVidWidget>::Adopt(QelMakeVar<Kind>(nullptr, name).Detach());
+}
+
+QelVidCompiledPart::Maker MakerOf(const std::string& kind) {
+  if (kind == "Frame") return &NewPart<QelVidCtlFrame>;
+  if (kind == "Label") return &NewPart<QelVidLabel>;
+  if (kind == "Grid") return &NewPart<QelVidLayGrid>;
+  if (kind == "Spacer") return &NewPart<QelVidSpacer>;
+  if (kind == "Expander") return &NewPart<QelVidCtlExpander>;
+  if (kind == "Button") return &NewPart<QelVidCtlButton>;
+  if (kind == "CheckButton") return &NewPart<QelVidCtlCheckButton>;
+  if (kind == "ScrollableArea") return &NewPart<QelVidCtlScrollableArea>;
+  if (kind == "Combo") return &NewPart<QelVidCtlImageAndLabelCombo>;
+  if (kind == "LineEditor") return &NewPart<QelVidCtlLineEditor>;
   return nullptr;
 }
 
@@ -132,6 +176,15 @@ class TemplateCompiler {
  public:
   TemplateCompiler(const std::string& className, const QelSYPMetaClass* meta) : className_(className), meta_(meta) {}
 
+  // The template's root, with the totals of the whole tree.
+  QelVidCompiledPart CompileTemplate(const json& node, const std::string& place) {
+    QelVidCompiledPart root = Compile(node, place);
+    root.handlerSlots = handlerNames_.size();
+    root.namedParts = namedParts_;
+    root.bindingCount = bindingCount_;
+    return root;
+  }
+
   QelVidCompiledPart Compile(const json& node, const std::string& place) {
     if (!node.is_object()) throw StyleError{place, "a part is an object"};
     for (const auto& [key, value] : node.items()) {
@@ -150,9 +203,11 @@ class TemplateCompiler {
     }
     part.name = QelString(name);
     // A sample of the kind answers which events it raises.
-    QelVar<QelVidWidget> sample = MakePart(part.kind, part.name);
+    part.make = MakerOf(part.kind);
+    QelVar<QelVidWidget> sample = part.make ? part.make(part.name) : nullptr;
     if (!sample) throw StyleError{place + "/kind", "unknown kind \"" + part.kind + "\""};
     if (!name.empty()) {
+      ++namedParts_;
       if (std::find(names_.begin(), names_.end(), name) != names_.end())
         throw StyleError{place + "/name", "the part name \"" + name + "\" is used twice"};
       names_.push_back(name);
@@ -184,6 +239,7 @@ class TemplateCompiler {
         throw StyleError{at, "the class " + meta_->GetClassName() + " has no property \"" +
                                  property.get<std::string>() + "\""};
       part.bindings.push_back({attribute, found});
+      ++bindingCount_;
     }
   }
 
@@ -199,7 +255,10 @@ class TemplateCompiler {
       if (!meta_->FindHandler(handler.get<std::string>()))
         throw StyleError{at, "the class " + meta_->GetClassName() + " has no handler \"" +
                                  handler.get<std::string>() + "\""};
-      part.routes.push_back({event, handler.get<std::string>()});
+      const std::string& handlerName = handler.get<std::string>();
+      auto slot = std::find(handlerNames_.begin(), handlerNames_.end(), handlerName);
+      if (slot == handlerNames_.end()) slot = handlerNames_.insert(handlerNames_.end(), handlerName);
+      part.routes.push_back({event, handlerName, static_cast<size_t>(slot - handlerNames_.begin())});
     }
   }
 
@@ -248,31 +307,43 @@ class TemplateCompiler {
   std::string className_;
   const QelSYPMetaClass* meta_;
   std::vector<std::string> names_;
+  std::vector<std::string> handlerNames_;
+  size_t namedParts_ = 0;
+  size_t bindingCount_ = 0;
 };
 
-// One handler per handler name serves every part routed to it.
-using HandlerCache = std::vector<std::pair<const std::string*, QelVar<QelSYPEventHandler>>>;
+// One handler per handler name serves every part routed to it, made on first need: one
+// slot per distinct name of the template.
+struct HandlerSlot {
+  bool made = false;
+  QelVar<QelSYPEventHandler> handler;
+};
+using HandlerCache = std::vector<HandlerSlot>;
 
 // Makes the widgets of a compiled template for `control`.
 QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* control, const QelSYPMetaClass* meta,
                                 HandlerCache& handlers) {
-  QelVar<QelVidWidget> part = MakePart(compiled.kind, compiled.name);
+  QelVar<QelVidWidget> part = compiled.make(compiled.name);
   if (!compiled.name.IsEmpty()) control->AddNamedPart(compiled.name.Str(), part.get());
   for (const auto& [attribute, value] : compiled.attributes) part->SetAttribute(attribute, value);
   for (const auto& binding : compiled.bindings) control->AddBinding(part.get(), binding.attribute, binding.property);
   for (const auto& route : compiled.routes) {
-    auto it = std::find_if(handlers.begin(), handlers.end(), [&](const auto& h) { return *h.first == route.handler; });
-    if (it == handlers.end()) {
-      handlers.emplace_back(&route.handler,
-                            QelVar<QelSYPEventHandler>::Adopt(meta->CreateHandler(control, route.handler)));
-      it = std::prev(handlers.end());
+    HandlerSlot& slot = handlers[route.slot];
+    if (!slot.made) {
+      slot.made = true;
+      slot.handler = QelVar<QelSYPEventHandler>::Adopt(meta->CreateHandler(control, route.handler));
     }
-    if (it->second) part->AddHandler(route.event, it->second.get(), 0);
+    if (slot.handler) part->AddHandler(route.event, slot.handler.get(), 0);
   }
-  if (auto* expander = dynamic_cast<QelVidCtlExpander*>(part.get())) {
-    if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta, handlers).get());
-    if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta, handlers).get());
+  // Only an expander has a header or a body, and only a part with children may be a grid:
+  // leaves, most parts of a row, need no cast.
+  if (compiled.header || compiled.body) {
+    if (auto* expander = dynamic_cast<QelVidCtlExpander*>(part.get())) {
+      if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta, handlers).get());
+      if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta, handlers).get());
+    }
   }
+  if (compiled.children.empty()) return part;
   auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
   for (size_t i = 0; i < compiled.children.size(); ++i) {
     QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta, handlers);
@@ -288,12 +359,22 @@ QelVidStyleSheet::QelVidStyleSheet(std::string path, std::unique_ptr<Document> d
 QelVidStyleSheet::~QelVidStyleSheet() = default;
 
 std::string QelVidStyleSheet::StyleFolder() {
-  std::string resources = QelGetEnv("QEL_RESOURCES_DIR");
+  std::string resources = QelGetEnv(kResourcesVariable);
   if (resources.empty()) resources = QEL_RESOURCES_SOURCE_DIR;
   return resources + "/styles";
 }
 
 const QelVidStyleSheet* QelVidStyleSheet::Load(const std::string& fileName, const std::string& forStyle) {
+  const char* setting = std::getenv(kResourcesVariable);
+  const std::string_view resourcesSetting = setting ? setting : "";
+  for (const RecentSheet& recent : Recent())
+    if (recent.fileName == fileName && recent.resourcesSetting == resourcesSetting) return recent.sheet;
+  const QelVidStyleSheet* sheet = LoadByPath(fileName, forStyle);
+  if (sheet) Recent().push_back({std::string(resourcesSetting), fileName, sheet});
+  return sheet;
+}
+
+const QelVidStyleSheet* QelVidStyleSheet::LoadByPath(const std::string& fileName, const std::string& forStyle) {
   const std::string path = StyleFolder() + "/" + fileName;
   const std::string asked = forStyle.empty() ? "" : " (style \"" + forStyle + "\" asked for)";
   if (auto it = Cache().find(path); it != Cache().end()) return it->second.get();
@@ -327,7 +408,10 @@ const QelVidStyleSheet* QelVidStyleSheet::Load(const std::string& fileName, cons
   return sheet;
 }
 
-void QelVidStyleSheet::ClearCache() { Cache().clear(); }
+void QelVidStyleSheet::ClearCache() {
+  Recent().clear();
+  Cache().clear();
+}
 
 bool QelVidStyleSheet::HasStyle(const std::string& style) const { return document_->root["styles"].contains(style); }
 
@@ -340,7 +424,9 @@ std::vector<std::string> QelVidStyleSheet::StyleNames() const {
 HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& style) const {
   if (!control) return E_FAIL;
   const QelSYPMetaClass* meta = control->GetSYPMetaClass();
-  auto& compiled = document_->compiled[{style, meta}];
+  auto found = document_->compiled.find(std::pair<std::string_view, const QelSYPMetaClass*>(style, meta));
+  if (found == document_->compiled.end()) found = document_->compiled.emplace(std::pair(style, meta), nullptr).first;
+  auto& compiled = found->second;
   if (!compiled) {
     const json& styles = document_->root["styles"];
     auto it = styles.find(style);
@@ -353,7 +439,8 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
       if (!it->is_object() || !it->contains("template"))
         throw StyleError{"/styles/" + style, "a style is an object with a \"template\""};
       TemplateCompiler compiler(control->IsA(), meta);
-      compiled = std::make_shared<QelVidCompiledPart>(compiler.Compile((*it)["template"], "/styles/" + style + "/template"));
+      compiled = std::make_shared<QelVidCompiledPart>(
+          compiler.CompileTemplate((*it)["template"], "/styles/" + style + "/template"));
     } catch (const StyleError& e) {
       document_->compiled.erase({style, meta});
       Report("style sheet " + path_ + ": style \"" + style + "\": at " + e.place + ": " + e.what);
@@ -365,7 +452,8 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
     }
   }
   std::shared_ptr<const QelVidCompiledPart> held = compiled;  // the map may change below
-  HandlerCache handlers;
+  HandlerCache handlers(held->handlerSlots);
+  control->ReserveTemplate(held->namedParts, held->bindingCount);
   QelVar<QelVidWidget> root = BuildParts(*held, control, meta, handlers);
   control->SetTemplateRoot(root.get());
   return S_OK;

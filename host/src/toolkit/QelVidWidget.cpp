@@ -14,7 +14,8 @@ const QelMetaObject& QelVidWidget::MetaObject() {
 }
 const QelMetaObject* QelVidWidget::GetMetaObject() const { return &MetaObject(); }
 
-QelVidWidget::QelVidWidget(QelVidWidget* parent, const QelString& name) : name_(name), parent_(parent) {}
+QelVidWidget::QelVidWidget(QelVidWidget* parent, const QelString& name)
+    : name_(name), parent_(parent), parentWidget_(parent) {}
 
 QelVidWidget::~QelVidWidget() = default;
 
@@ -23,7 +24,7 @@ void* QelVidWidget::QueryDirect(const QelIID& iid) {
   return QelBaseUnknown::QueryDirect(iid);
 }
 
-QelVidWidget* QelVidWidget::GetParent() const { return dynamic_cast<QelVidWidget*>(parent_.GetRaw()); }
+QelVidWidget* QelVidWidget::GetParent() const { return parent_.GetRaw() ? parentWidget_ : nullptr; }
 
 QelVidWidget* QelVidWidget::GetChild(int index) const {
   return index >= 0 && index < GetChildCount() ? children_[index].get() : nullptr;
@@ -34,6 +35,7 @@ void QelVidWidget::AddChild(QelVidWidget* child) {
   QelVar<QelVidWidget> keep = QelVar<QelVidWidget>::Retain(child);
   if (QelVidWidget* old = child->GetParent()) old->RemoveChild(child);
   child->parent_ = QelBaseUnknown_WR(this);
+  child->parentWidget_ = this;
   if (children_.empty()) children_.reserve(4);
   children_.push_back(std::move(keep));
 }
@@ -45,6 +47,7 @@ bool QelVidWidget::RemoveChild(QelVidWidget* child) {
   QelVar<QelVidWidget> leaving = std::move(*it);
   children_.erase(it);
   leaving->parent_.Reset();
+  leaving->parentWidget_ = nullptr;
   return true;
 }
 
