@@ -36,6 +36,8 @@ struct SysLogNotice {
     QelSetSysLogFile(file.empty() ? QelSettingRepository::SettingsFolder() + "/qelhost.log" : file);
   }
   ~SysLogNotice() {
+    std::cout.flush();  // after everything the session printed
+    std::fflush(stdout);
     if (QelSysLogCount() > 0)
       std::fprintf(stderr, "qelhost: %d internal check report(s) written to %s\n", QelSysLogCount(),
                    QelSysLogFile().c_str());
