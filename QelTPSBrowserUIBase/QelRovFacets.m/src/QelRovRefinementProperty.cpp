@@ -49,19 +49,22 @@ QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, const Q
   QelListValQelBaseUnknown_var children;
   resolved->GetChildren(children);
   childCount_ = children.Size();
-  const char* style = "SingleElementStyle";
+  // Made once: these names are longer than a short string and every row names them.
+  static const QelString sheet(kSheet);
+  static const QelString singleElement("SingleElementStyle");
+  static const QelString expanderStyle("ExpanderStyle");
+  static const QelString rangeStyle("RangeStyle");
+  static const QelString noVariant;
+  const QelString* style = &singleElement;
   kind_ = KindSingleElement;
   if (childCount_ > 0) {
     kind_ = KindExpander;
-    style = "ExpanderStyle";
+    style = &expanderStyle;
   } else if (resolved->GetFlags() & QelRovFacetProperty::FlagValueRange) {
     kind_ = KindRange;
-    style = "RangeStyle";
+    style = &rangeStyle;
   }
-  // Made once: the sheet's name is longer than a short string and every row names it.
-  static const QelString sheet(kSheet);
-  static const QelString noVariant;
-  SetCustomStyle(sheet, QelString(style), noVariant);
+  SetCustomStyle(sheet, *style, noVariant);
 }
 
 QelRovRefinementProperty::~QelRovRefinementProperty() = default;
