@@ -381,6 +381,7 @@ QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* c
                                 QelVidRouteHandler* router) {
   QelVar<QelVidWidget> part = compiled.make(compiled.name);
   if (!compiled.name.IsEmpty()) control->AddNamedPart(compiled.name.Str(), part.get());
+  part->ReserveAttributes(compiled.attributes.size() + compiled.bindings.size());
   for (const auto& [attribute, value] : compiled.attributes) part->SetAttribute(attribute, value);
   for (const auto& binding : compiled.bindings) control->AddBinding(part.get(), binding.attribute, binding.property);
   for (const auto& route : compiled.routes) {
