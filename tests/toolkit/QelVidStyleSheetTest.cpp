@@ -144,3 +144,35 @@ TEST(QelVidStyleSheet, TheSameFileNameInAnotherFolderIsThatFoldersSheet) {
   EXPECT_EQ(probe->presses.size(), 2u);
   EXPECT_TRUE(QelVidStyleSheet::TakeDiagnostics().empty());
 }
+
+// A styled control's handlers are made on the first event of their name and kept for the
+// next; parts that outlive their control make none and call nothing.
+TEST(QelVidStyleSheet, HandlersAreMadeOnTheirFirstEventAndNeverForAGoneControl) {
+  StyleFolder folder;
+  folder.Write("probe.sypstyle", kGoodSheet);
+  auto probe = QelMakeVar<ProbeControl>();
+  ASSERT_EQ(probe->SetCustomStyle(QelString("probe.sypstyle"), QelString("Main"), QelString("")), S_OK);
+  probe->flag = 1;
+  probe->DispatchModifyProperty("Flag");
+  auto press = QelVar<QelVidWidget>::Retain(probe->RetrieveSypNamedObject(QelString("Press")));
+  auto body = QelVar<QelVidWidget>::Retain(probe->RetrieveSypNamedObject(QelString("Body")));
+  auto* button = dynamic_cast<QelVidCtlButton*>(press.get());
+  ASSERT_NE(button, nullptr);
+
+  const int64_t styled = QelBaseUnknown::LiveObjectCount();
+  EXPECT_TRUE(button->Click());
+  const int64_t afterFirst = QelBaseUnknown::LiveObjectCount();
+  EXPECT_EQ(afterFirst, styled + 1);  // the OnPress handler, nothing for OnEnter yet
+  EXPECT_TRUE(button->Click());
+  body->MouseEnter();
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), afterFirst + 1);
+  EXPECT_EQ(probe->presses.size(), 2u);
+  EXPECT_EQ(probe->enters, 1);
+
+  probe = nullptr;  // the parts held here outlive their control
+  const int64_t gone = QelBaseUnknown::LiveObjectCount();
+  body->MouseEnter();
+  button->Click();
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), gone);
+  EXPECT_TRUE(QelVidStyleSheet::TakeDiagnostics().empty());
+}

@@ -7,9 +7,9 @@
 namespace {
 using W = QelRovRefinementProperty;
 
-const QelSYPPropertyRecord_Boxed kColorProperties[] = {
-    {"LineColor", "", "QelVidColor", 1, "", 1, &QelRovSYPGetBoxed<W, &W::GetLineColor>, nullptr, 0},
-    {"BorderColor", "", "QelVidColor", 1, "", 1, &QelRovSYPGetBoxed<W, &W::GetBorderColor>, nullptr, 0},
+const QelSYPPropertyRecord_QelVidColor kColorProperties[] = {
+    {"LineColor", "", "QelVidColor", 1, "", 1, &QelRovSYPGetColor<W, &W::GetLineColor>, nullptr, 0},
+    {"BorderColor", "", "QelVidColor", 1, "", 1, &QelRovSYPGetColor<W, &W::GetBorderColor>, nullptr, 0},
 };
 
 const QelSYPPropertyRecord_int kIntProperties[] = {
@@ -48,7 +48,7 @@ class QelRovRefinementPropertySYPMetaClassBuilder final : public QelSYPMetaClass
   QelRovRefinementPropertySYPMetaClassBuilder()
       : QelSYPMetaClassBuilder("QelRovRefinementProperty", "QelTPSBrowserUIBase") {}
   void Build() override {
-    SetProperties(kColorProperties, 2);
+    SetProperties_QelVidColor(kColorProperties, 2);
     SetProperties_int(kIntProperties, 7);
     SetProperties_QelUnicodeString(kTextProperties, 4);
     SetEventHandlers(kHandlers, 10);

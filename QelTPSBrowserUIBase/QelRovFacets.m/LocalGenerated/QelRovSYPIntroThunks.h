@@ -40,6 +40,12 @@ QelBaseUnknown* QelRovSYPGetBoxed(QelBaseUnknown* object) {
   return self ? (self->*Get)() : nullptr;
 }
 
+template <class T, QelVidColor (T::*Get)() const>
+QelVidColor QelRovSYPGetColor(QelBaseUnknown* object) {
+  T* self = QelRovSYPSelf<T>(object);
+  return self ? (self->*Get)() : QelVidColor();
+}
+
 template <class T, void (T::*Member)(QelBaseUnknown*, QelSYPEventArgs*)>
 QelSYPEventHandler* QelRovSYPMakeHandler(QelBaseUnknown* i_pObj) {
   if (!QelTkCheckPointer(i_pObj, "i_pObj")) return nullptr;

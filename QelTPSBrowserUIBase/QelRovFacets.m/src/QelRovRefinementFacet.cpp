@@ -76,20 +76,26 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
   QelListValQelBaseUnknown_var properties;
   facet->GetProperties(properties);
   const int n = properties.Size();
-  const std::string baseName = facetName_.Utf8() + "_Property";
+  std::string rowName = facetName_.Utf8() + "_Property";
+  const size_t baseLength = rowName.size();
+  // One forwarder serves every row: it only needs this section, which it holds weakly.
+  QelSYPEvent* propEvent = QelRovRefinementProperty::SendPropEvent();
+  auto forwarder = QelMakeVar<QelSYPWRefMethEventHandler<QelRovRefinementFacet>>(
+      this, &QelRovRefinementFacet::ForwardPropertyEvent);
   int hidden = 0;
   for (int i = 1; i <= n; ++i) {
     QelBaseUnknown* property = properties[i].get();
     // Hidden rows do not break the alternation of the rows shown.
     const bool alternate = (i - hidden) % 2 == 0;
-    QelVar<QelRovRefinementProperty> widget = QelMakeVar<QelRovRefinementProperty>(
-        this, QelString(baseName + std::to_string(i - 1)), property, alternate);
+    rowName.resize(baseLength);
+    rowName += std::to_string(i - 1);
+    QelVar<QelRovRefinementProperty> widget =
+        QelMakeVar<QelRovRefinementProperty>(this, QelString(rowName), property, alternate);
     if (QelFailed(widget->BuildContent())) {
       QelAssertBool();
       continue;
     }
-    QelSYPWRefMethEventHandler<QelRovRefinementFacet>::Connect(widget.get(), QelRovRefinementProperty::SendPropEvent(),
-                                                               this, &QelRovRefinementFacet::ForwardPropertyEvent);
+    if (QelTkCheckPointer(propEvent, "i_pEvent")) widget->AddHandler(propEvent, forwarder.get(), 0);
     grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
     auto* facetProperty = QelSysDynamicCast<QelRovFacetProperty>(property);
     if (facetProperty && !facetProperty->GetVisibleFlag()) {

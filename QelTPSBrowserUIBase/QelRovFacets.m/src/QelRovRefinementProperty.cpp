@@ -1,7 +1,6 @@
 #include "QelRovRefinementProperty.h"
 
 #include "QelAssert.h"
-#include "QelBoxingOfQelVidColor.h"
 #include "QelListValQelBaseUnknown_var.h"
 #include "QelRovFacetProperty.h"
 #include "QelSYP.h"
@@ -12,6 +11,7 @@
 #include "QelVidCtlLineEditor.h"
 #include "QelVidGridConstraints.h"
 #include "QelVidLayGrid.h"
+#include "QelVidPalette.h"
 
 namespace {
 constexpr const char* kSheet = "QelRovRefinementProperty.sypstyle";
@@ -49,16 +49,22 @@ QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, const Q
   QelListValQelBaseUnknown_var children;
   resolved->GetChildren(children);
   childCount_ = children.Size();
-  const char* style = "SingleElementStyle";
+  // Made once: these names are longer than a short string and every row names them.
+  static const QelString sheet(kSheet);
+  static const QelString singleElement("SingleElementStyle");
+  static const QelString expanderStyle("ExpanderStyle");
+  static const QelString rangeStyle("RangeStyle");
+  static const QelString noVariant;
+  const QelString* style = &singleElement;
   kind_ = KindSingleElement;
   if (childCount_ > 0) {
     kind_ = KindExpander;
-    style = "ExpanderStyle";
+    style = &expanderStyle;
   } else if (resolved->GetFlags() & QelRovFacetProperty::FlagValueRange) {
     kind_ = KindRange;
-    style = "RangeStyle";
+    style = &rangeStyle;
   }
-  SetCustomStyle(QelString(kSheet), QelString(style), QelString(""));
+  SetCustomStyle(sheet, *style, noVariant);
 }
 
 QelRovRefinementProperty::~QelRovRefinementProperty() = default;
@@ -206,15 +212,14 @@ QelSYPEvent* QelRovRefinementProperty::SendPropEvent() {
   return event;
 }
 
-QelBaseUnknown* QelRovRefinementProperty::GetLineColor() const {
-  if (hovered_) return QelBoxingOfQelVidColor::Box(QelVidColor(106, 158, 190, 100));
-  return QelBoxingOfQelVidColor::Box(
-      QelVidColor(alternate_ ? 0.1 : 0.0, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2)));
+QelVidColor QelRovRefinementProperty::GetLineColor() const {
+  if (hovered_) return QelVidColor(106, 158, 190, 100);
+  return QelVidColor(alternate_ ? 0.1 : 0.0, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
 }
 
-QelBaseUnknown* QelRovRefinementProperty::GetBorderColor() const {
-  if (hovered_) return QelBoxingOfQelVidColor::Box(QelVidColor(33, 110, 159, 120));
-  return QelBoxingOfQelVidColor::Box(QelVidColor(0.0, 0, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2)));
+QelVidColor QelRovRefinementProperty::GetBorderColor() const {
+  if (hovered_) return QelVidColor(33, 110, 159, 120);
+  return QelVidColor(0.0, 0, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
 }
 
 int QelRovRefinementProperty::GetIconVisibility() const { return GetIcon().IsEmpty() ? 0 : 1; }

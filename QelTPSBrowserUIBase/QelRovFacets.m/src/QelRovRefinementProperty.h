@@ -7,6 +7,7 @@
 #include "QelBaseUnknown_WR.h"
 #include "QelSYPEventArgs.h"
 #include "QelUnicodeString.h"
+#include "QelVidColor.h"
 #include "QelVidCtl.h"
 
 class QelRovFacetProperty;
@@ -42,8 +43,8 @@ class QelRovRefinementProperty : public QelVidCtl {
   QelString GetResourceFilename(int level) const override;
 
   // Introspectable properties.
-  QelBaseUnknown* GetLineColor() const;  // boxed, a new reference
-  QelBaseUnknown* GetBorderColor() const;
+  QelVidColor GetLineColor() const;
+  QelVidColor GetBorderColor() const;
   int GetIconVisibility() const;
   int GetCheckState() const { return checked_ ? 1 : 0; }
   int GetExpandedFlag() const;

@@ -3,6 +3,7 @@
 // type, getter, optional setter: no setter means read-only), its event handlers (name,
 // argument type, handler factory), a creation function and a base meta class. Made by a
 // builder (QelSYPMetaClassBuilder), then kept until the framework that built it unloads.
+#include <cstddef>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -20,6 +21,8 @@ using QelSYPSetter_QelUnicodeString = void (*)(QelBaseUnknown* object, const Qel
 // Boxed values: the getter gives a new reference to a boxed object (QelBoxingOf...).
 using QelSYPGetter_Boxed = QelBaseUnknown* (*)(QelBaseUnknown* object);
 using QelSYPSetter_Boxed = void (*)(QelBaseUnknown* object, QelBaseUnknown* boxed);
+// Colours read by value: no boxed object per read, for properties bound on every row.
+using QelSYPGetter_QelVidColor = QelVidColor (*)(QelBaseUnknown* object);
 // A new handler (one reference, the caller's) bound to `object`, or null.
 using QelSYPHandlerFactory = QelSYPEventHandler* (*)(QelBaseUnknown* object);
 // A new object of the class (one reference, the caller's).
@@ -43,6 +46,8 @@ using QelSYPPropertyRecord_Boxed = QelSYPPropertyRecord<QelSYPGetter_Boxed, QelS
 using QelSYPPropertyRecord_int = QelSYPPropertyRecord<QelSYPGetter_int, QelSYPSetter_int>;
 using QelSYPPropertyRecord_QelUnicodeString =
     QelSYPPropertyRecord<QelSYPGetter_QelUnicodeString, QelSYPSetter_QelUnicodeString>;
+// Read-only colours by value; the setter slot stays empty (a settable colour goes boxed).
+using QelSYPPropertyRecord_QelVidColor = QelSYPPropertyRecord<QelSYPGetter_QelVidColor, std::nullptr_t>;
 
 struct QelSYPEventHandlerRecord {
   const char* name;
@@ -61,6 +66,7 @@ class QelSYPMetaClass {
     QelSYPGetter_QelUnicodeString getText = nullptr;
     QelSYPSetter_QelUnicodeString setText = nullptr;
     QelSYPGetter_Boxed getBoxed = nullptr;
+    QelSYPGetter_QelVidColor getColor = nullptr;
     QelSYPSetter_Boxed setBoxed = nullptr;
   };
   struct Handler {

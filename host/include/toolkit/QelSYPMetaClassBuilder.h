@@ -28,6 +28,7 @@ class QelSYPMetaClassBuilder : public QelBaseUnknown {
   void SetProperties(const QelSYPPropertyRecord_Boxed* records, int count);
   void SetProperties_int(const QelSYPPropertyRecord_int* records, int count);
   void SetProperties_QelUnicodeString(const QelSYPPropertyRecord_QelUnicodeString* records, int count);
+  void SetProperties_QelVidColor(const QelSYPPropertyRecord_QelVidColor* records, int count);
   void SetEventHandlers(const QelSYPEventHandlerRecord* records, int count);
   // Ends the description. An unknown base is reported and the class gets none.
   void CreateMetaClass(QelSYPCreateFunction create, const char* baseMetaClass);

@@ -57,6 +57,9 @@ class QelVidWidget : public QelISYPIntrospectable {
 
   // Attributes: what a style sets or binds. Kinds react to theirs in OnAttributeChanged.
   void SetAttribute(const std::string& name, const QelSYPValue& value);
+  // Room for `count` attributes, for a maker that knows how many it will set: rows of
+  // styled parts then carry no unused slots.
+  void ReserveAttributes(size_t count) { attributes_.reserve(count); }
   QelSYPValue GetAttribute(const std::string& name) const;
   int IntAttribute(const std::string& name, int fallback) const;
   QelUnicodeString TextAttribute(const std::string& name) const;

@@ -101,6 +101,10 @@ bool QelSYPMetaClass::Read(QelBaseUnknown* object, const Property& property, Qel
     value = p->getText(object);
     return true;
   }
+  if (p->getColor) {
+    value = p->getColor(object);
+    return true;
+  }
   if (p->getBoxed) {
     QelBaseUnknown_var boxed = QelBaseUnknown_var::Adopt(p->getBoxed(object));
     QelVidColor color;

@@ -79,6 +79,17 @@ void QelSYPMetaClassBuilder::SetProperties_QelUnicodeString(const QelSYPProperty
   }
 }
 
+void QelSYPMetaClassBuilder::SetProperties_QelVidColor(const QelSYPPropertyRecord_QelVidColor* records, int count) {
+  for (int i = 0; records && i < count; ++i) {
+    QelSYPMetaClass::Property p;
+    p.name = records[i].name;
+    p.type = records[i].type;
+    p.readOnly = true;
+    p.getColor = records[i].getter;
+    properties_.push_back(std::move(p));
+  }
+}
+
 void QelSYPMetaClassBuilder::SetEventHandlers(const QelSYPEventHandlerRecord* records, int count) {
   for (int i = 0; records && i < count; ++i)
     handlers_.push_back({records[i].name, records[i].argumentType ? records[i].argumentType : "", records[i].factory});

@@ -10,6 +10,7 @@
 
 #include "QelAssert.h"
 #include "QelMsgCatalog.h"
+#include "QelSYPEventArgs.h"
 #include "QelSYPEventHandler.h"
 #include "QelSYPMetaClass.h"
 #include "QelVidCtl.h"
@@ -60,6 +61,7 @@ struct QelVidCompiledPart {
   std::unique_ptr<QelVidCompiledPart> body;
   // Whole-template totals, kept on the root only: a control reserves for them once.
   size_t handlerSlots = 0;
+  size_t routeCount = 0;
   size_t namedParts = 0;
   size_t bindingCount = 0;
 };
@@ -180,6 +182,7 @@ class TemplateCompiler {
   QelVidCompiledPart CompileTemplate(const json& node, const std::string& place) {
     QelVidCompiledPart root = Compile(node, place);
     root.handlerSlots = handlerNames_.size();
+    root.routeCount = routeCount_;
     root.namedParts = namedParts_;
     root.bindingCount = bindingCount_;
     return root;
@@ -259,6 +262,7 @@ class TemplateCompiler {
       auto slot = std::find(handlerNames_.begin(), handlerNames_.end(), handlerName);
       if (slot == handlerNames_.end()) slot = handlerNames_.insert(handlerNames_.end(), handlerName);
       part.routes.push_back({event, handlerName, static_cast<size_t>(slot - handlerNames_.begin())});
+      ++routeCount_;
     }
   }
 
@@ -310,43 +314,92 @@ class TemplateCompiler {
   std::vector<std::string> handlerNames_;
   size_t namedParts_ = 0;
   size_t bindingCount_ = 0;
+  size_t routeCount_ = 0;
 };
 
-// One handler per handler name serves every part routed to it, made on first need: one
-// slot per distinct name of the template.
-struct HandlerSlot {
-  bool made = false;
-  QelVar<QelSYPEventHandler> handler;
+// The one handler of a styled control: it serves every route of the control's template,
+// knowing per routed part and event which handler name to call, and makes the handler of
+// a name the first time one of its events comes. Rows that are never clicked or hovered
+// thus cost one counted object instead of one per handler name. It holds the control
+// weakly, like the handlers it makes.
+class QelVidRouteHandler final : public QelSYPEventHandler {
+ public:
+  QelVidRouteHandler(QelVidCtl* control, const QelSYPMetaClass* meta,
+                     std::shared_ptr<const QelVidCompiledPart> compiled)
+      : control_(static_cast<QelBaseUnknown*>(control)),
+        meta_(meta),
+        compiled_(std::move(compiled)),
+        handlers_(compiled_->handlerSlots) {
+    routes_.reserve(compiled_->routeCount);
+  }
+
+  void AddRoute(QelVidWidget* part, const QelVidCompiledPart::Route& route) {
+    routes_.push_back({part, route.event, &route});
+  }
+
+  void HandleEvent(QelVidWidget* current, QelBaseUnknown* args) override {
+    auto* eventArgs = dynamic_cast<QelSYPEventArgs*>(args);
+    QelSYPEvent* event = eventArgs ? eventArgs->GetEvent() : nullptr;
+    for (const Entry& entry : routes_) {
+      if (entry.part != current || entry.event != event) continue;
+      Slot& slot = handlers_[entry.route->slot];
+      if (!slot.made) {
+        QelBaseUnknown_var control = control_.Get();
+        if (!control) return;
+        slot.made = true;
+        slot.handler = QelVar<QelSYPEventHandler>::Adopt(meta_->CreateHandler(control.get(), entry.route->handler));
+      }
+      // Held: the handler may rebuild the control, and with it this router's owners.
+      if (QelVar<QelSYPEventHandler> handler = slot.handler) handler->HandleEvent(current, args);
+      return;
+    }
+  }
+
+ protected:
+  ~QelVidRouteHandler() override = default;
+
+ private:
+  struct Entry {
+    QelVidWidget* part;  // a part of the control, which holds this router: never dangling here
+    QelSYPEvent* event;
+    const QelVidCompiledPart::Route* route;  // in compiled_
+  };
+  struct Slot {
+    bool made = false;
+    QelVar<QelSYPEventHandler> handler;
+  };
+
+  QelBaseUnknown_WR control_;
+  const QelSYPMetaClass* meta_;
+  std::shared_ptr<const QelVidCompiledPart> compiled_;
+  std::vector<Entry> routes_;
+  std::vector<Slot> handlers_;
 };
-using HandlerCache = std::vector<HandlerSlot>;
 
 // Makes the widgets of a compiled template for `control`.
 QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* control, const QelSYPMetaClass* meta,
-                                HandlerCache& handlers) {
+                                QelVidRouteHandler* router) {
   QelVar<QelVidWidget> part = compiled.make(compiled.name);
   if (!compiled.name.IsEmpty()) control->AddNamedPart(compiled.name.Str(), part.get());
+  part->ReserveAttributes(compiled.attributes.size() + compiled.bindings.size());
   for (const auto& [attribute, value] : compiled.attributes) part->SetAttribute(attribute, value);
   for (const auto& binding : compiled.bindings) control->AddBinding(part.get(), binding.attribute, binding.property);
   for (const auto& route : compiled.routes) {
-    HandlerSlot& slot = handlers[route.slot];
-    if (!slot.made) {
-      slot.made = true;
-      slot.handler = QelVar<QelSYPEventHandler>::Adopt(meta->CreateHandler(control, route.handler));
-    }
-    if (slot.handler) part->AddHandler(route.event, slot.handler.get(), 0);
+    router->AddRoute(part.get(), route);
+    part->AddHandler(route.event, router, 0);
   }
   // Only an expander has a header or a body, and only a part with children may be a grid:
   // leaves, most parts of a row, need no cast.
   if (compiled.header || compiled.body) {
     if (auto* expander = dynamic_cast<QelVidCtlExpander*>(part.get())) {
-      if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta, handlers).get());
-      if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta, handlers).get());
+      if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta, router).get());
+      if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta, router).get());
     }
   }
   if (compiled.children.empty()) return part;
   auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
   for (size_t i = 0; i < compiled.children.size(); ++i) {
-    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta, handlers);
+    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta, router);
     if (grid && compiled.cells[i]) grid->AddWidget(child.get(), *compiled.cells[i]);
     else part->AddChild(child.get());
   }
@@ -452,9 +505,10 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
     }
   }
   std::shared_ptr<const QelVidCompiledPart> held = compiled;  // the map may change below
-  HandlerCache handlers(held->handlerSlots);
   control->ReserveTemplate(held->namedParts, held->bindingCount);
-  QelVar<QelVidWidget> root = BuildParts(*held, control, meta, handlers);
+  QelVar<QelVidRouteHandler> router;
+  if (held->routeCount > 0) router = QelMakeVar<QelVidRouteHandler>(control, meta, held);
+  QelVar<QelVidWidget> root = BuildParts(*held, control, meta, router.get());
   control->SetTemplateRoot(root.get());
   return S_OK;
 }

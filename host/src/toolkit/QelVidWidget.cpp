@@ -61,7 +61,7 @@ QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
 
 void QelVidWidget::SetAttribute(const std::string& name, const QelSYPValue& value) {
   // Most widgets carry a handful: one allocation instead of a growth series.
-  if (attributes_.empty()) attributes_.reserve(4);
+  if (attributes_.capacity() == 0) attributes_.reserve(4);
   auto it = std::find_if(attributes_.begin(), attributes_.end(), [&](const auto& a) { return a.first == name; });
   if (it == attributes_.end()) attributes_.emplace_back(name, value);
   else it->second = value;
