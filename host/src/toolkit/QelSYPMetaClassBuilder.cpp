@@ -2,6 +2,7 @@
 
 #include <map>
 #include <memory>
+#include <vector>
 
 #include "QelAssert.h"
 
@@ -42,41 +43,37 @@ std::string QelSYPMetaClassBuilder::FrameworkOf(const std::string& builderName) 
 QelSYPMetaClassBuilder::QelSYPMetaClassBuilder(const char* className, const char* framework)
     : className_(className ? className : ""), framework_(framework ? framework : "") {}
 
-void QelSYPMetaClassBuilder::SetProperties(const QelSYPPropertyRecord_Boxed* records, int count) {
+namespace {
+// The record kinds differ only in which getter and setter of the property they fill; a
+// property without a setter, or marked read-only, keeps a null setter.
+template <class Record, class Getter, class Setter>
+void AppendProperties(std::vector<QelSYPMetaClass::Property>& properties, const Record* records, int count,
+                      Getter QelSYPMetaClass::Property::*getter, Setter QelSYPMetaClass::Property::*setter) {
   for (int i = 0; records && i < count; ++i) {
     QelSYPMetaClass::Property p;
     p.name = records[i].name;
     p.type = records[i].type;
     p.readOnly = records[i].readOnly != 0 || !records[i].setter;
-    p.getBoxed = records[i].getter;
-    p.setBoxed = p.readOnly ? nullptr : records[i].setter;
-    properties_.push_back(std::move(p));
+    p.*getter = records[i].getter;
+    if (!p.readOnly) p.*setter = records[i].setter;
+    properties.push_back(std::move(p));
   }
+}
+}  // namespace
+
+void QelSYPMetaClassBuilder::SetProperties(const QelSYPPropertyRecord_Boxed* records, int count) {
+  AppendProperties(properties_, records, count, &QelSYPMetaClass::Property::getBoxed,
+                   &QelSYPMetaClass::Property::setBoxed);
 }
 
 void QelSYPMetaClassBuilder::SetProperties_int(const QelSYPPropertyRecord_int* records, int count) {
-  for (int i = 0; records && i < count; ++i) {
-    QelSYPMetaClass::Property p;
-    p.name = records[i].name;
-    p.type = records[i].type;
-    p.readOnly = records[i].readOnly != 0 || !records[i].setter;
-    p.getInt = records[i].getter;
-    p.setInt = p.readOnly ? nullptr : records[i].setter;
-    properties_.push_back(std::move(p));
-  }
+  AppendProperties(properties_, records, count, &QelSYPMetaClass::Property::getInt, &QelSYPMetaClass::Property::setInt);
 }
 
 void QelSYPMetaClassBuilder::SetProperties_QelUnicodeString(const QelSYPPropertyRecord_QelUnicodeString* records,
                                                             int count) {
-  for (int i = 0; records && i < count; ++i) {
-    QelSYPMetaClass::Property p;
-    p.name = records[i].name;
-    p.type = records[i].type;
-    p.readOnly = records[i].readOnly != 0 || !records[i].setter;
-    p.getText = records[i].getter;
-    p.setText = p.readOnly ? nullptr : records[i].setter;
-    properties_.push_back(std::move(p));
-  }
+  AppendProperties(properties_, records, count, &QelSYPMetaClass::Property::getText,
+                   &QelSYPMetaClass::Property::setText);
 }
 
 void QelSYPMetaClassBuilder::SetProperties_QelVidColor(const QelSYPPropertyRecord_QelVidColor* records, int count) {
