@@ -58,7 +58,8 @@ TEST(QelStepImporterTest, Ctc01GivesDatumsTolerancesDimensionsAndItsView) {
 
     ASSERT_EQ(model["sets"].size(), 1u) << "one product owns every annotation";
     const Json& set = model["sets"][0];
-    EXPECT_FALSE(set["light"]);
+    EXPECT_TRUE(set["light"]) << "the views browser lists only light sets";
+    EXPECT_EQ(set["rootSet"], "arm") << "the root shows its part's set as its own";
     EXPECT_EQ(set["owner"], model["root"]["children"][0]["id"]) << "the solid part owns the annotations";
 
     // Each datum letter once, though every tolerance citing it repeats it in the file.

@@ -188,8 +188,13 @@ QelBaseUnknown_var QelStepPmiReader::SetFor(const std::string& owner) {
   const bool isRoot = product->IsEqual(builder_.Root().get());
   std::string alias;
   if (auto* named = QelModelObject::From(product.get())) alias = named->Alias();
+  // What a file gives is already the lightweight review form (tessellated shapes, drawn
+  // annotations), so sets are light and the views browser shows their captures; the root
+  // presents the sets of the parts below it as its own, as an assembly does.
   QelBaseUnknown_var set = builder_.AddSet(
-      product, {.alias = alias + " Annotations", .rootScope = isRoot ? QelRootSetScope::Direct : QelRootSetScope::None});
+      product, {.alias = alias + " Annotations",
+                .light = true,
+                .rootScope = isRoot ? QelRootSetScope::Direct : QelRootSetScope::ARM});
   sets_.emplace(owner, set);
   return set;
 }
