@@ -145,6 +145,34 @@ TEST(QelRasterizerTest, GoldenPictures) {
   ExpectLooksLike(*large, "003-annotation.png");
 }
 
+// Annotations without a drawing of their own often share an anchor; each label must stay
+// readable, and a crowd of them must not make the picture slow to place.
+TEST(QelRasterizerTest, LabelsSharingAnAnchorMoveAsideInsteadOfCovering) {
+  QelTextRenderer text;
+  if (!text.IsReady()) GTEST_SKIP() << text.Error();
+  QelRenderScene scene;
+  scene.annotations.push_back({{0, 0, 0}, {}, {1, 0, 0}, "Datum A"});
+  scene.annotations.push_back({{0, 0, 0}, {}, {0, 0, 1}, "Datum B"});
+  QelRenderView view = LookDownZ(10);
+  view.background = {0, 0, 0};
+  view.text = &text;
+  auto image = QelMakeVar<QelPixelImage>(200, 120);
+  QelRasterizer::Render(scene, view, *image);
+  int red = 0, blue = 0;
+  for (int i = 0, n = image->GetWidth() * image->GetHeight(); i < n; ++i) {
+    const uint8_t* p = image->GetPixels() + i * 3;
+    red += p[0] == 255 && p[1] == 0 && p[2] == 0;
+    blue += p[0] == 0 && p[1] == 0 && p[2] == 255;
+  }
+  // A whole frame border is about 2 * (width + height) * 2 pixels: far more than the anchor's dot.
+  EXPECT_GT(red, 150) << "the first label is covered by the second";
+  EXPECT_GT(blue, 150);
+
+  scene.annotations.assign(5000, {{0, 0, 0}, {}, {0, 1, 0}, "crowded"});
+  QelRasterizer::Render(scene, view, *image);
+  EXPECT_TRUE(HasColor(*image, 0, 255, 0));
+}
+
 TEST(QelPngWriterTest, RefusesAnUnwritablePathNamingIt) {
   auto image = QelMakeVar<QelPixelImage>(4, 4);
   std::string error;

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <cstdint>
 #include <numbers>
+#include <vector>
 
 #include "QelMathVectorf.h"
 #include "QelTextRenderer.h"
@@ -248,7 +249,79 @@ bool Clipped(const QelRenderView& view, const QelMathPoint& p) {
   return false;
 }
 
-void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& view, const QelRenderAnnotation& a) {
+// Where label frames already lie, so a later frame can move aside instead of covering one:
+// annotations without a drawing of their own often share an anchor. A coarse grid keeps
+// each test local, so crowded pictures stay linear in the number of labels.
+class LabelPlacer {
+ public:
+  struct Box {
+    int left, top, w, h;
+  };
+  LabelPlacer(int width, int height) : width_(width), height_(height), cols_(Cells(width)), rows_(Cells(height)) {
+    grid_.resize(static_cast<size_t>(cols_) * rows_);
+  }
+
+  // The frame of size w x h for an anchor: up and right of it when that is free, else the
+  // first free place among rows stacked above and below it and the same on its left. A
+  // moved frame stays inside the picture; when no place is free the frame keeps its first
+  // place and covers what is there.
+  Box Place(int ax, int ay, int w, int h) {
+    const Box first{ax + 6, ay - 6 - h, w, h};
+    Box chosen = first;
+    if (!Free(first)) {
+      bool found = false;
+      for (int step = 1; step <= kSteps && !found; ++step) {
+        for (const int dir : {-1, 1}) {
+          for (const int left : {ax + 6, ax - 6 - w}) {
+            const Box b{left, first.top + dir * step * (h + 2), w, h};
+            if (Inside(b) && Free(b)) {
+              chosen = b;
+              found = true;
+              break;
+            }
+          }
+          if (found) break;
+        }
+      }
+    }
+    Mark(chosen);
+    return chosen;
+  }
+
+ private:
+  static constexpr int kCell = 32, kSteps = 12;
+  static int Cells(int pixels) { return std::max(1, (pixels + kCell - 1) / kCell); }
+  bool Inside(const Box& b) const { return b.left >= 0 && b.top >= 0 && b.left + b.w <= width_ && b.top + b.h <= height_; }
+  static bool Overlap(const Box& a, const Box& b) {
+    return a.left < b.left + b.w && b.left < a.left + a.w && a.top < b.top + b.h && b.top < a.top + a.h;
+  }
+  template <typename Fn>
+  void ForCells(const Box& b, Fn fn) const {
+    const int c0 = std::clamp(b.left / kCell, 0, cols_ - 1), c1 = std::clamp((b.left + b.w - 1) / kCell, 0, cols_ - 1);
+    const int r0 = std::clamp(b.top / kCell, 0, rows_ - 1), r1 = std::clamp((b.top + b.h - 1) / kCell, 0, rows_ - 1);
+    if (b.left + b.w <= 0 || b.top + b.h <= 0 || b.left >= width_ || b.top >= height_) return;
+    for (int r = r0; r <= r1; ++r)
+      for (int c = c0; c <= c1; ++c) fn(static_cast<size_t>(r) * cols_ + c);
+  }
+  bool Free(const Box& b) const {
+    bool free = true;
+    ForCells(b, [&](size_t cell) {
+      for (const int i : grid_[cell]) free = free && !Overlap(b, boxes_[i]);
+    });
+    return free;
+  }
+  void Mark(const Box& b) {
+    boxes_.push_back(b);
+    const int index = static_cast<int>(boxes_.size()) - 1;
+    ForCells(b, [&](size_t cell) { grid_[cell].push_back(index); });
+  }
+  int width_, height_, cols_, rows_;
+  std::vector<Box> boxes_;
+  std::vector<std::vector<int>> grid_;
+};
+
+void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& view, const QelRenderAnnotation& a,
+                    LabelPlacer& labels) {
   if (Clipped(view, a.anchor)) return;
   Vtx anchor;
   anchor.e = f.ToEye(a.anchor);
@@ -284,7 +357,11 @@ void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
   const int textWidth = view.text ? view.text->Measure(a.text) : 0;
   const int textHeight = view.text ? view.text->LineHeight() : 10;
   const int w = std::max(textWidth, 24) + 2 * pad, h = textHeight + 2 * pad;
-  const int left = ax + 6, top = ay - 6 - h;
+  const LabelPlacer::Box box = labels.Place(ax, ay, w, h);
+  const int left = box.left, top = box.top;
+  // A frame moved aside keeps a thin leader to its anchor.
+  if (left != ax + 6 || top != ay - 6 - h)
+    Line(image, ax, ay, left < ax ? left + w - 1 : left, top < ay ? top + h - 1 : top, rgb);
   const uint8_t paper[3] = {250, 250, 245};
   for (int y = top; y < top + h; ++y)
     for (int x = left; x < left + w; ++x) {
@@ -311,6 +388,8 @@ void QelRasterizer::Render(const QelRenderScene& scene, const QelRenderView& vie
   Target target{image, std::vector<float>(static_cast<size_t>(width) * height, 0.0f), width, height};
   const Frame frame(view, width, height);
   for (const QelRenderMesh& mesh : scene.meshes) DrawMesh(target, frame, view, mesh);
-  if (view.annotations)
-    for (const QelRenderAnnotation& a : scene.annotations) DrawAnnotation(image, frame, view, a);
+  if (view.annotations) {
+    LabelPlacer labels(width, height);
+    for (const QelRenderAnnotation& a : scene.annotations) DrawAnnotation(image, frame, view, a, labels);
+  }
 }
