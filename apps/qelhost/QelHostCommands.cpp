@@ -2,8 +2,6 @@
 
 #include <ostream>
 
-#include <dlfcn.h>
-
 #include "QelDlgNotify.h"
 #include "QelHostBrowser.h"
 #include "QelHostPanelCommands.h"
@@ -57,9 +55,7 @@ bool Thumbnail(QelHostSession& session, const std::vector<std::string>& args, st
     return false;
   QelReviewFramework::Register();
   session.Out().flush();
-  // The plug-in is loaded globally, so the program's own handle finds its toolbox.
-  static void* const global = dlopen(nullptr, RTLD_NOW);
-  if (QelHostPictures::WriteThumbnails(global, session.Root(), args[0], args[1]) != 0) {
+  if (QelHostPictures::WriteThumbnails(session.Module(), session.Root(), args[0], args[1]) != 0) {
     error = "thumbnail '" + args[0] + "' not written (see above)";
     return false;
   }

@@ -155,11 +155,22 @@ int QelHostPictures::WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, con
 }
 
 
+bool QelHostPictures::FindExportedAddress(void* module, const char* name, void*& address) {
+  dlerror();  // a stale error would be taken for this look-up's
+  address = dlsym(module, name);
+  if (const char* why = dlerror()) {
+    std::fprintf(stderr, "qelhost: %s\n", why);
+    address = nullptr;
+  }
+  return address != nullptr;
+}
+
 int QelHostPictures::WriteThumbnails(void* module, QelBaseUnknown* root, const std::string& name,
                                      const std::string& output) {
-  auto preview = module ? reinterpret_cast<PreviewFn>(dlsym(module, kPreviewSymbol)) : nullptr;
-  auto describe = module ? reinterpret_cast<DescriptionFn>(dlsym(module, kDescriptionSymbol)) : nullptr;
-  if (!preview || !describe) {
+  PreviewFn preview = nullptr;
+  DescriptionFn describe = nullptr;
+  if (!module || !QelHostPictures::FindExport(module, kPreviewSymbol, preview) ||
+      !QelHostPictures::FindExport(module, kDescriptionSymbol, describe)) {
     std::fprintf(stderr, "qelhost: the plug-in exports no thumbnail toolbox\n");
     return 1;
   }

@@ -15,6 +15,17 @@ namespace QelHostPictures {
 int WriteThumbnails(void* module, QelBaseUnknown* root, const std::string& name, const std::string& output);
 int WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file);
 
+// Looks up a function the plug-in exports by its (mangled) name; false, with the loader's
+// reason on stderr, when the module has no such export.
+bool FindExportedAddress(void* module, const char* name, void*& address);
+template <class F>
+bool FindExport(void* module, const char* name, F& function) {
+  void* address = nullptr;
+  if (!FindExportedAddress(module, name, address)) return false;
+  function = reinterpret_cast<F>(address);
+  return true;
+}
+
 // True when `args` ask for pictures; then `exitCode` is what qelhost returns.
 bool Run(const std::vector<std::string>& args, const std::string& modulePath, const std::string& sampleText,
          const std::string& sampleName, int& exitCode);

@@ -43,6 +43,10 @@ class QelHostSession {
   // reported and the session goes on. Also answers the confirmation questions.
   int RunInteractive();
 
+  // The loaded plug-in (a QelModuleLoader handle), for the functions it exports by name.
+  void SetModule(void* module) { module_ = module; }
+  void* Module() const { return module_; }
+
   bool QuitRequested() const { return quit_; }
   void RequestQuit() { quit_ = true; }
 
@@ -73,4 +77,5 @@ class QelHostSession {
   std::vector<QelBaseUnknown_var> changed_;           // in order of first change
   std::map<QelBaseUnknown*, bool> shownBefore_;       // state before the first change
   bool quit_ = false;
+  void* module_ = nullptr;
 };

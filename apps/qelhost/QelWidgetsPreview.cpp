@@ -25,10 +25,8 @@ int QelWidgetsPreviewMain(int argc, char** argv) {
     std::fprintf(stderr, "qelhost: %s\n", error.c_str());
     return 1;
   }
-  if (!QelModuleLoader::Load("libQelRovFacets.so", error)) {
-    std::fprintf(stderr, "qelhost: %s\n", error.c_str());
-    return 1;
-  }
+  // The preview library carries its own copy of the module (it reaches the module's
+  // internals, which the plug-in does not export), registered when it loads.
   void* preview = QelModuleLoader::Load("libQelWidgetsPreview.so", error);
   if (!preview) {
     std::fprintf(stderr, "qelhost: %s\n", error.c_str());

@@ -16,11 +16,11 @@
 #include "QelHostDemo.h"
 #include "QelHostModelFiles.h"
 #include "QelHostOptions.h"
+#include "QelHostPlugin.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
 #include "QelModelLoader.h"
 #include "QelModelPrinter.h"
-#include "QelModuleLoader.h"
 #include "QelRovFacetFilterData.h"
 #include "QelRovFacetServices.h"
 #include "QelSampleProduct.h"
@@ -43,8 +43,6 @@ struct SysLogNotice {
                    QelSysLogFile().c_str());
   }
 };
-
-constexpr const char* kModuleFramework = "QelTPSBrowserUIBase";
 
 // Prints or writes the requested user settings; false when one could not be done.
 bool HandleSettings(const std::vector<QelHostOptions::SettingRequest>& requests) {
@@ -117,23 +115,11 @@ void ApplyFilter(QelBaseUnknown* root, const QelHostOptions& options) {
   QelRovFacetServices::EnableDisableDisplay(annotations, 1, filter.get());
 }
 
-void* LoadPlugin(const QelHostOptions& options) {
-  std::string error;
-  void* module = QelModuleLoader::Load(options.modulePath, error);
-  if (!module) {
-    std::fprintf(stderr, "qelhost: %s\n", error.c_str());
-    return nullptr;
-  }
-  std::vector<std::string> registered = QelDictionary::Get().Describe(kModuleFramework);
-  std::printf("plug-in %s loaded: %zu registrations\n", options.modulePath.c_str(), registered.size());
-  if (options.listModule)
-    for (const auto& line : registered) std::printf("  %s\n", line.c_str());
-  return module;
-}
 // The review session on the open model: the script given, else a person at the
 // terminal, else the commands on standard input.
-int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options) {
+int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options, void* module) {
   QelHostSession session(std::cout, std::cerr);
+  session.SetModule(module);
   std::string error;
   const std::string name = options.modelPath.empty() ? kQelSampleProductName : options.modelPath;
   if (options.demo)
@@ -191,6 +177,7 @@ int main(int argc, char** argv) {
     return 0;
   }
 
+  const int64_t objectsBefore = QelBaseUnknown::LiveObjectCount();
   QelBaseUnknown_var root;
   HRESULT loaded = options.modelPath.empty()
                        ? QelModelLoader::LoadText(kQelSampleProductText, kQelSampleProductName, root, error)
@@ -208,11 +195,17 @@ int main(int argc, char** argv) {
     return 0;
   }
   std::printf("model %s\n", options.modelPath.empty() ? kQelSampleProductName : options.modelPath.c_str());
-  if (!LoadPlugin(options)) return 1;
+  std::fflush(stdout);
+  void* module = QelHostPlugin::Load(options.modulePath, options.listModule, std::cout);
+  if (!module) return 1;
   if (!HandleSettings(options.settings)) return 1;
   if (!ApplyDisplayChanges(root.get(), options.displayChanges)) return 1;
   if (options.defaultOnly || options.tolerance) ApplyFilter(root.get(), options);
   std::cout << '\n';
   QelModelPrinter::Print(root.get(), std::cout);
-  return RunSession(root, options);
+  const int status = RunSession(root, options, module);
+  // The model goes first: data extensions the plug-in attached to its objects run the
+  // plug-in's code when they go.
+  root = nullptr;
+  return QelHostPlugin::Unload(module, options.modulePath, objectsBefore, std::cout) ? status : 1;
 }

@@ -7,9 +7,10 @@
 #include "QelITPSView.h"
 #include "QelPathElement.h"
 #include "QelPixelImage.h"
+#include "QelRovFacetsExport.h"
 #include "QelUnicodeString.h"
 
-class QelRovBrowserViewToolbox {
+class QEL_ROV_EXPORT QelRovBrowserViewToolbox {
  public:
   QelRovBrowserViewToolbox() = delete;
 

@@ -3,11 +3,12 @@
 // exact names. A tie factory gives a new tie holding one reference to the implementation
 // (null for a null implementation); the direct factory gives the object itself.
 #include "QelBaseUnknown.h"
+#include "QelRovFacetsExport.h"
 
 extern "C" {
-QelBaseUnknown* CreateTIEQelIDbrBrowserContextQelDbrBrowserContextLFT(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelILumLightLoadModeObserverQelDbrBrowserContextLFT(QelBaseUnknown* impl);
-QelBaseUnknown* CreateBOAQelIDbrBrowserContextFactoryQelERovBrowserContextFactory(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelIDbrBrowserViewBaseUIQelERovViewsBrowserViewBaseUI(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelIVIABaseUIQelERovViewsBrowserViewBaseUI(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIDbrBrowserContextQelDbrBrowserContextLFT(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelILumLightLoadModeObserverQelDbrBrowserContextLFT(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateBOAQelIDbrBrowserContextFactoryQelERovBrowserContextFactory(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIDbrBrowserViewBaseUIQelERovViewsBrowserViewBaseUI(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIVIABaseUIQelERovViewsBrowserViewBaseUI(QelBaseUnknown* impl);
 }

@@ -2,5 +2,6 @@
 // Introspection table of QelRovRefinementDlg, registered under
 // "QelRovRefinementDlgSYPMetaClassBuilder".
 #include "QelBaseUnknown.h"
+#include "QelRovFacetsExport.h"
 
-extern "C" QelBaseUnknown* fctCreateQelRovRefinementDlgSYPMetaClassBuilder();
+extern "C" QEL_ROV_EXPORT QelBaseUnknown* fctCreateQelRovRefinementDlgSYPMetaClassBuilder();

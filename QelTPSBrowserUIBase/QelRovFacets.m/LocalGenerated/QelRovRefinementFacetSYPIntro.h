@@ -2,5 +2,6 @@
 // Introspection table of QelRovRefinementFacet, registered under
 // "QelRovRefinementFacetSYPMetaClassBuilder".
 #include "QelBaseUnknown.h"
+#include "QelRovFacetsExport.h"
 
-extern "C" QelBaseUnknown* fctCreateQelRovRefinementFacetSYPMetaClassBuilder();
+extern "C" QEL_ROV_EXPORT QelBaseUnknown* fctCreateQelRovRefinementFacetSYPMetaClassBuilder();

@@ -2,5 +2,6 @@
 // Introspection table of QelRovRefinementProperty, registered under
 // "QelRovRefinementPropertySYPMetaClassBuilder".
 #include "QelBaseUnknown.h"
+#include "QelRovFacetsExport.h"
 
-extern "C" QelBaseUnknown* fctCreateQelRovRefinementPropertySYPMetaClassBuilder();
+extern "C" QEL_ROV_EXPORT QelBaseUnknown* fctCreateQelRovRefinementPropertySYPMetaClassBuilder();

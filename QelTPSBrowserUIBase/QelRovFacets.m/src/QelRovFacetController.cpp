@@ -23,10 +23,17 @@ QelString KeyOf(const QelString& workbench) { return QelString(std::string(kKeyP
 }  // namespace
 
 const QelMetaObject& QelRovFacetController::MetaObject() {
-  static const QelMetaObject& meta = QelMetaObject::Declare("QelRovFacetController", QelMetaKind::Implementation,
-                                                            &QelBaseUnknown::MetaObject(), "QelTPSBrowserUIBase");
+  // The controller derives from the host's interface, so a host asking IsAKindOf by the
+  // interface's name is answered yes; the host declares nothing for it, hence the
+  // declaration here (Declare gives the existing record when there is one).
+  static const QelMetaObject& base = QelMetaObject::Declare("QelIHyxFacetCtrl", QelMetaKind::Implementation,
+                                                            &QelBaseUnknown::MetaObject(), "QelHost");
+  static const QelMetaObject& meta =
+      QelMetaObject::Declare(ClassName(), QelMetaKind::Implementation, &base, "QelTPSBrowserUIBase");
   return meta;
 }
+const char* QelRovFacetController::ClassName() { return "QelRovFacetController"; }
+const char* QelRovFacetController::ClassId() { return MetaObject().Name(); }
 const QelMetaObject* QelRovFacetController::GetMetaObject() const { return &MetaObject(); }
 
 void* QelRovFacetController::QueryDirect(const QelIID& iid) {
@@ -51,6 +58,8 @@ void QelRovFacetController::ReleaseAtUnload() {
   instance = nullptr;
   controller->Release();
 }
+
+QelBaseUnknown* QelRovFacetController::CreateItself() { return Create(); }
 
 QelRovFacetController* QelRovFacetController::GetDataFilterController() { return Instance(); }
 

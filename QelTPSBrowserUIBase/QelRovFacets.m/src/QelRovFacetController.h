@@ -8,21 +8,26 @@
 #include "QelIHyxFacetCtrl.h"
 #include "QelListValQelBaseUnknown_var.h"
 #include "QelMetaObject.h"
+#include "QelRovFacetsExport.h"
 #include "QelString.h"
 
 class QelFrmEditor;
 class QelRovFacetGroup;
 class QelSettingRepository;
 
-class QelRovFacetController : public QelIHyxFacetCtrl {
+class QEL_ROV_EXPORT QelRovFacetController : public QelIHyxFacetCtrl {
  public:
-  static const char* ClassName() { return "QelRovFacetController"; }
+  static const char* ClassName();
+  // The class's identifier in the component framework: its meta class's name.
+  static const char* ClassId();
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override;
 
   // The named creation function: the process-wide controller with a new reference, made
   // on first use; null when the refinement switch is off.
   static QelBaseUnknown* Create();
+  // What the meta class creates: the process-wide controller again, never a second one.
+  static QelBaseUnknown* CreateItself();
   // The exit action of the module: ends the subscriptions and drops the process-wide
   // controller (and with it every group and panel).
   static void ReleaseAtUnload();

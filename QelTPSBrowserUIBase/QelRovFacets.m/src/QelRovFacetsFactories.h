@@ -3,13 +3,14 @@
 // names. Each tie factory takes the implementation object and gives a new tie holding one
 // reference to it (null for a null implementation).
 #include "QelBaseUnknown.h"
+#include "QelRovFacetsExport.h"
 
 extern "C" {
-QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetGroup(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotationSet(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetView(QelBaseUnknown* impl);
-QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotation(QelBaseUnknown* impl);
-QelBaseUnknown* CreateBOAQelIHyxFacetCtrlQelRovFacetController(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetGroup(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotationSet(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetView(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotation(QelBaseUnknown* impl);
+QEL_ROV_EXPORT QelBaseUnknown* CreateBOAQelIHyxFacetCtrlQelRovFacetController(QelBaseUnknown* impl);
 }

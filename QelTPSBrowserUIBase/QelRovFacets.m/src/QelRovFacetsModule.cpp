@@ -1,6 +1,7 @@
 // Load-time entry of the module. Registration of the module's classes runs here, once,
-// from the one initialiser below, in the order the host expects; entries for classes
-// still to come take their place in that order as they arrive.
+// from the one initialiser below, in the order the host expects: per class its meta class
+// then its dictionary entries, the controller's exit action and named creation function
+// among them, then the introspection builders, then the interface descriptions.
 #include "QelDbrBrowserContextLFT.h"
 #include "QelDelayedDestruction.h"
 #include "QelDictionary.h"
@@ -25,14 +26,11 @@
 #include "QelIVIABaseUI.h"
 #include "QelModuleVersion.h"
 #include "QelRovBrowsersFactories.h"
-#include "QelRovFacet.h"
 #include "QelRovFacetAnnotation.h"
 #include "QelRovFacetAnnotationSet.h"
 #include "QelRovFacetController.h"
 #include "QelRovFacetGroup.h"
-#include "QelRovFacetProperty.h"
 #include "QelRovFacetPropertyGroup.h"
-#include "QelRovFacetPropertyItem.h"
 #include "QelRovFacetsFactories.h"
 #include "QelRovFacetView.h"
 #include "QelRovRefinementDlgSYPIntro.h"
@@ -40,13 +38,15 @@
 #include "QelRovRefinementPropertySYPIntro.h"
 #include "QelSYPMetaClassBuilder.h"
 
-// The controller answers QelIHyxFacetCtrl itself; it is only ever made by name.
+// The controller answers QelIHyxFacetCtrl itself; it is only ever made by name, so the
+// direct factory hands back what it is given and creates nothing.
 extern "C" QelBaseUnknown* CreateBOAQelIHyxFacetCtrlQelRovFacetController(QelBaseUnknown* impl) {
   if (impl) impl->AddRef();
   return impl;
 }
 
 extern "C" const char* QelRovFacetsModuleName() { return "QelRovFacets"; }
+extern "C" const int QelModuleAbiVersion = kQelModuleAbiVersion;
 
 namespace {
 constexpr const char* kFramework = "QelTPSBrowserUIBase";
@@ -56,56 +56,72 @@ void DescribeInterface(const char* name) {
   QelInterfaceDescription::Declare(name, I::IID, kFramework);
 }
 
+template <class I>
+void Enter(const QelMetaObject& meta, QelFactory factory) {
+  QelDictionary::Get().Register(meta.Name(), I::IID, factory, kFramework);
+}
+
+// A data extension: its creator under each late type it extends, then its interface.
+template <class I>
+void EnterExtension(const QelMetaObject& meta, QelExtensionCreator creator, QelFactory factory) {
+  for (const std::string& lateType : meta.LateTypes())
+    QelDictionary::Get().RegisterExtension(lateType, meta, creator, kFramework);
+  Enter<I>(meta, factory);
+}
+
+// Runs while the library is still mapped, before its entries leave the dictionary: the
+// controller drops its host callbacks and its groups, and panels and dialogs queued for
+// delayed destruction (whose destructors are the module's code) go now rather than later.
+void ExitAction() {
+  QelRovFacetController::ReleaseAtUnload();
+  while (QelDelayedDestruction::PendingCount() > 0) QelDelayedDestruction::FlushIdle();
+}
+
 void QelRovFacetsRegister() {
   QelDictionary& dictionary = QelDictionary::Get();
 
   // The views browser: the light context, the context factory on occurrences and DMU
   // validations, the item adapter on light views and captures.
-  const char* lightContext = QelDbrBrowserContextLFT::MetaObject().Name();
-  dictionary.Register(lightContext, QelIDbrBrowserContext::IID,
-                      &CreateTIEQelIDbrBrowserContextQelDbrBrowserContextLFT, kFramework);
-  dictionary.Register(lightContext, QelILumLightLoadModeObserver::IID,
-                      &CreateTIEQelILumLightLoadModeObserverQelDbrBrowserContextLFT, kFramework);
-  const QelMetaObject& factory = QelERovBrowserContextFactory::MetaObject();
-  for (const std::string& lateType : factory.LateTypes())
-    dictionary.RegisterExtension(lateType, factory, &QelERovBrowserContextFactory::Create, kFramework);
-  dictionary.Register(factory.Name(), QelIDbrBrowserContextFactory::IID,
-                      &CreateBOAQelIDbrBrowserContextFactoryQelERovBrowserContextFactory, kFramework);
+  const QelMetaObject& lightContext = QelDbrBrowserContextLFT::MetaObject();
+  Enter<QelIDbrBrowserContext>(lightContext, &CreateTIEQelIDbrBrowserContextQelDbrBrowserContextLFT);
+  Enter<QelILumLightLoadModeObserver>(lightContext, &CreateTIEQelILumLightLoadModeObserverQelDbrBrowserContextLFT);
+  EnterExtension<QelIDbrBrowserContextFactory>(QelERovBrowserContextFactory::MetaObject(),
+                                               &QelERovBrowserContextFactory::Create,
+                                               &CreateBOAQelIDbrBrowserContextFactoryQelERovBrowserContextFactory);
   const QelMetaObject& itemUI = QelERovViewsBrowserViewBaseUI::MetaObject();
-  for (const std::string& lateType : itemUI.LateTypes())
-    dictionary.RegisterExtension(lateType, itemUI, &QelERovViewsBrowserViewBaseUI::Create, kFramework);
-  dictionary.Register(itemUI.Name(), QelIDbrBrowserViewBaseUI::IID,
-                      &CreateTIEQelIDbrBrowserViewBaseUIQelERovViewsBrowserViewBaseUI, kFramework);
-  dictionary.Register(itemUI.Name(), QelIVIABaseUI::IID, &CreateTIEQelIVIABaseUIQelERovViewsBrowserViewBaseUI,
-                      kFramework);
+  EnterExtension<QelIDbrBrowserViewBaseUI>(itemUI, &QelERovViewsBrowserViewBaseUI::Create,
+                                           &CreateTIEQelIDbrBrowserViewBaseUIQelERovViewsBrowserViewBaseUI);
+  Enter<QelIVIABaseUI>(itemUI, &CreateTIEQelIVIABaseUIQelERovViewsBrowserViewBaseUI);
 
-  QelRovFacet::MetaObject();
-  QelRovFacetProperty::MetaObject();
-  QelRovFacetPropertyItem::MetaObject();
+  // The annotation facet and the annotation set facet, observers of their properties.
+  Enter<QelIRovFacetPropertyObserver>(QelRovFacetAnnotation::MetaObject(),
+                                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotation);
+  Enter<QelIRovFacetPropertyObserver>(QelRovFacetAnnotationSet::MetaObject(),
+                                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotationSet);
 
-  // The facet controller: made by name, answering QelIHyxFacetCtrl itself. Its exit
-  // action is the loader's destructor below.
-  dictionary.RegisterNamedCreator(QelRovFacetController::ClassName(), &QelRovFacetController::Create, kFramework);
-  dictionary.Register(QelRovFacetController::ClassName(), QelIHyxFacetCtrl::IID,
-                      &CreateBOAQelIHyxFacetCtrlQelRovFacetController, kFramework);
+  // The facet controller: its exit action, the creation function the host calls by
+  // name, then QelIHyxFacetCtrl, which it answers itself.
+  const QelMetaObject& controller = QelRovFacetController::MetaObject();
+  dictionary.RegisterExitAction(&ExitAction, kFramework);
+  dictionary.RegisterNamedCreator(controller.Name(), &QelRovFacetController::Create, kFramework);
+  Enter<QelIHyxFacetCtrl>(controller, &CreateBOAQelIHyxFacetCtrlQelRovFacetController);
 
-  // The facet group.
-  dictionary.Register(QelRovFacetGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
-                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetGroup, kFramework);
-  dictionary.Register(QelRovFacetGroup::MetaObject().Name(), QelILumLightLoadModeObserver::IID,
-                      &CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup, kFramework);
+  const QelMetaObject& group = QelRovFacetGroup::MetaObject();
+  Enter<QelIRovFacetPropertyObserver>(group, &CreateTIEQelIRovFacetPropertyObserverQelRovFacetGroup);
+  Enter<QelILumLightLoadModeObserver>(group, &CreateTIEQelILumLightLoadModeObserverQelRovFacetGroup);
 
-  // The three facets, each the observer of its top-level properties.
-  dictionary.Register(QelRovFacetAnnotation::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
-                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotation, kFramework);
-  dictionary.Register(QelRovFacetAnnotationSet::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
-                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetAnnotationSet, kFramework);
-  dictionary.Register(QelRovFacetView::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
-                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetView, kFramework);
+  Enter<QelIRovFacetPropertyObserver>(QelRovFacetPropertyGroup::MetaObject(),
+                                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup);
+  Enter<QelIRovFacetPropertyObserver>(QelRovFacetView::MetaObject(),
+                                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetView);
 
-  // The property group.
-  dictionary.Register(QelRovFacetPropertyGroup::MetaObject().Name(), QelIRovFacetPropertyObserver::IID,
-                      &CreateTIEQelIRovFacetPropertyObserverQelRovFacetPropertyGroup, kFramework);
+  // The introspection builders of the panel widgets.
+  QelSYPMetaClassBuilder::Register("QelRovRefinementDlgSYPMetaClassBuilder",
+                                   &fctCreateQelRovRefinementDlgSYPMetaClassBuilder, kFramework);
+  QelSYPMetaClassBuilder::Register("QelRovRefinementFacetSYPMetaClassBuilder",
+                                   &fctCreateQelRovRefinementFacetSYPMetaClassBuilder, kFramework);
+  QelSYPMetaClassBuilder::Register("QelRovRefinementPropertySYPMetaClassBuilder",
+                                   &fctCreateQelRovRefinementPropertySYPMetaClassBuilder, kFramework);
 
   // The interfaces: the module's own, then the host's that it queries or implements.
   DescribeInterface<QelIRovFacetPropertyObserver>("QelIRovFacetPropertyObserver");
@@ -119,24 +135,19 @@ void QelRovFacetsRegister() {
   DescribeInterface<QelITPSLightSet>("QelITPSLightSet");
   DescribeInterface<QelILumLightLoadModeObserver>("QelILumLightLoadModeObserver");
   DescribeInterface<QelITPSLight>("QelITPSLight");
-
-  // The introspection builders of the panel widgets.
-  QelSYPMetaClassBuilder::Register("QelRovRefinementDlgSYPMetaClassBuilder",
-                                   &fctCreateQelRovRefinementDlgSYPMetaClassBuilder, kFramework);
-  QelSYPMetaClassBuilder::Register("QelRovRefinementFacetSYPMetaClassBuilder",
-                                   &fctCreateQelRovRefinementFacetSYPMetaClassBuilder, kFramework);
-  QelSYPMetaClassBuilder::Register("QelRovRefinementPropertySYPMetaClassBuilder",
-                                   &fctCreateQelRovRefinementPropertySYPMetaClassBuilder, kFramework);
+  // The host's interfaces it implements, so that a host lists the entries above by name.
+  DescribeInterface<QelIDbrBrowserContext>("QelIDbrBrowserContext");
+  DescribeInterface<QelIDbrBrowserContextFactory>("QelIDbrBrowserContextFactory");
+  DescribeInterface<QelIDbrBrowserViewBaseUI>("QelIDbrBrowserViewBaseUI");
+  DescribeInterface<QelIVIABaseUI>("QelIVIABaseUI");
+  DescribeInterface<QelIHyxFacetCtrl>("QelIHyxFacetCtrl");
 }
 
-// Registers at load and takes every entry back at unload, so that no dictionary entry
-// outlives the factories it points into.
+// Registers at load; at unload the dictionary runs the exit action and takes every entry
+// back, so that no entry outlives the factories it points into.
 struct QelRovFacetsLoader {
   QelRovFacetsLoader() { QelRovFacetsRegister(); }
   ~QelRovFacetsLoader() {
-    QelRovFacetController::ReleaseAtUnload();
-    // Panels and dialogs queued for release run the module's code: they go before it does.
-    while (QelDelayedDestruction::PendingCount() > 0) QelDelayedDestruction::FlushIdle();
     QelDictionary::Get().RemoveFramework(kFramework);
     QelSYPMetaClassBuilder::RemoveFramework(kFramework);
   }

@@ -6,6 +6,7 @@
 //
 // Entries carry the framework that registered them so that a module being unloaded can
 // take all of its entries back (its factories would otherwise dangle).
+#include <cstdint>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -21,6 +22,9 @@ using QelFactory = QelBaseUnknown* (*)(QelBaseUnknown* impl);
 using QelExtensionCreator = QelBaseUnknown* (*)(QelBaseUnknown* extended);
 // Creates (or hands out) a named component, with a new reference.
 using QelNamedCreator = QelBaseUnknown* (*)();
+// Run when the framework that registered it is taken out of the dictionary (its module is
+// being unloaded): the last moment its code may still run.
+using QelExitAction = void (*)();
 
 class QelDictionary {
  public:
@@ -31,7 +35,9 @@ class QelDictionary {
   void RegisterExtension(std::string_view lateType, const QelMetaObject& extension, QelExtensionCreator creator,
                          std::string_view framework = {});
   void RegisterNamedCreator(std::string_view name, QelNamedCreator creator, std::string_view framework = {});
-  // Removes every entry registered under the framework's name.
+  void RegisterExitAction(QelExitAction action, std::string_view framework);
+  // Runs the framework's exit actions (latest first), then removes every entry
+  // registered under its name.
   void RemoveFramework(std::string_view framework);
 
   QelFactory FindFactory(std::string_view classOrLateType, const QelIID& iid) const;
@@ -46,10 +52,24 @@ class QelDictionary {
     const QelMetaObject* extension;
     QelExtensionCreator creator;
     std::string framework;
+    uint64_t order = 0;
   };
   // One line per entry ("<key> <interface name or identifier> <framework>", "<late type> extension <class>",
   // "component <name>"), for a person to see what a module registered.
   std::vector<std::string> Describe(std::string_view framework = {}) const;
+
+  // One registration of a framework, as a host lists it: `function` is the factory,
+  // extension creator, named creator or exit action (a host can name it from its module).
+  struct Registration {
+    enum class Kind { Factory, Extension, Component, ExitAction };
+    Kind kind;
+    std::string key;  // class or late type; component name; empty for an exit action
+    QelIID iid;       // factories only
+    const QelMetaObject* extension = nullptr;
+    const void* function = nullptr;
+  };
+  // The framework's registrations in the order they were made.
+  std::vector<Registration> RegistrationsOf(std::string_view framework) const;
 
   // The extensions registered for a late type, in order of registration.
   std::vector<const ExtensionEntry*> ExtensionsOf(std::string_view lateType) const;
@@ -61,17 +81,26 @@ class QelDictionary {
     QelIID iid;
     QelFactory factory;
     std::string framework;
+    uint64_t order;
   };
   struct NamedEntry {
     std::string name;
     QelNamedCreator creator;
     std::string framework;
+    uint64_t order;
+  };
+  struct ExitEntry {
+    QelExitAction action;
+    std::string framework;
+    uint64_t order;
   };
   std::vector<FactoryEntry> factories_;
   std::vector<QelIID> interfaces_;  // distinct identifiers of factories_
   void IndexInterfaces();
   std::vector<ExtensionEntry> extensions_;
   std::vector<NamedEntry> named_;
+  std::vector<ExitEntry> exits_;
+  uint64_t nextOrder_ = 0;
 };
 
 // Creates the component registered under `name` and queries `iid` on it. E_FAIL when no

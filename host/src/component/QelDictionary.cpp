@@ -19,7 +19,7 @@ void QelDictionary::Register(std::string_view classOrLateType, const QelIID& iid
       return;
     }
   }
-  factories_.push_back({std::string(classOrLateType), iid, factory, std::string(framework)});
+  factories_.push_back({std::string(classOrLateType), iid, factory, std::string(framework), nextOrder_++});
   if (!HasFactoryFor(iid)) interfaces_.push_back(iid);
 }
 
@@ -42,7 +42,7 @@ void QelDictionary::RegisterExtension(std::string_view lateType, const QelMetaOb
       return;
     }
   }
-  extensions_.push_back({std::string(lateType), &extension, creator, std::string(framework)});
+  extensions_.push_back({std::string(lateType), &extension, creator, std::string(framework), nextOrder_++});
 }
 
 void QelDictionary::RegisterNamedCreator(std::string_view name, QelNamedCreator creator, std::string_view framework) {
@@ -53,11 +53,22 @@ void QelDictionary::RegisterNamedCreator(std::string_view name, QelNamedCreator 
       return;
     }
   }
-  named_.push_back({std::string(name), creator, std::string(framework)});
+  named_.push_back({std::string(name), creator, std::string(framework), nextOrder_++});
+}
+
+void QelDictionary::RegisterExitAction(QelExitAction action, std::string_view framework) {
+  if (action) exits_.push_back({action, std::string(framework), nextOrder_++});
 }
 
 void QelDictionary::RemoveFramework(std::string_view framework) {
   auto of = [&](const auto& entry) { return entry.framework == framework; };
+  // Taken out before running, so an action that unloads more cannot run twice; the
+  // entries stay while they run, since releasing the module's objects may still query.
+  std::vector<ExitEntry> leaving;
+  for (auto& entry : exits_)
+    if (of(entry)) leaving.push_back(entry);
+  std::erase_if(exits_, of);
+  for (auto it = leaving.rbegin(); it != leaving.rend(); ++it) it->action();
   std::erase_if(factories_, of);
   IndexInterfaces();
   std::erase_if(extensions_, of);
@@ -94,6 +105,27 @@ std::vector<std::string> QelDictionary::Describe(std::string_view framework) con
   for (const auto& entry : named_)
     if (wanted(entry.framework)) lines.push_back("component " + entry.name + " " + entry.framework);
   return lines;
+}
+
+std::vector<QelDictionary::Registration> QelDictionary::RegistrationsOf(std::string_view framework) const {
+  std::vector<std::pair<uint64_t, Registration>> found;
+  using Kind = Registration::Kind;
+  for (const auto& e : factories_)
+    if (e.framework == framework)
+      found.push_back({e.order, {Kind::Factory, e.key, e.iid, nullptr, reinterpret_cast<const void*>(e.factory)}});
+  for (const auto& e : extensions_)
+    if (e.framework == framework)
+      found.push_back({e.order, {Kind::Extension, e.lateType, {}, e.extension, reinterpret_cast<const void*>(e.creator)}});
+  for (const auto& e : named_)
+    if (e.framework == framework)
+      found.push_back({e.order, {Kind::Component, e.name, {}, nullptr, reinterpret_cast<const void*>(e.creator)}});
+  for (const auto& e : exits_)
+    if (e.framework == framework)
+      found.push_back({e.order, {Kind::ExitAction, {}, {}, nullptr, reinterpret_cast<const void*>(e.action)}});
+  std::sort(found.begin(), found.end(), [](const auto& a, const auto& b) { return a.first < b.first; });
+  std::vector<Registration> registrations;
+  for (auto& [order, registration] : found) registrations.push_back(std::move(registration));
+  return registrations;
 }
 
 HRESULT QelInstantiateComponent(const char* name, const QelIID& iid, void** out) {
