@@ -38,9 +38,9 @@ const QelMetaObject* QelRovRefinementProperty::GetMetaObject() const { return &M
 
 QelRovRefinementProperty::QelRovRefinementProperty() : QelVidCtl(nullptr, QelString()) {}
 
-QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, const QelString& name,
-                                                   QelBaseUnknown* property, bool alternate)
-    : QelVidCtl(parent, name), property_(property), alternate_(alternate) {
+QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, QelString name, QelBaseUnknown* property,
+                                                   bool alternate)
+    : QelVidCtl(parent, std::move(name)), property_(property), alternate_(alternate) {
   QelBaseUnknown_var hold;
   QelRovFacetProperty* resolved = ResolveProperty(hold);
   if (!resolved) return;

@@ -31,7 +31,7 @@ class QelRovRefinementProperty : public QelVidCtl {
 
   // For the introspection meta class: nothing set, no style.
   QelRovRefinementProperty();
-  QelRovRefinementProperty(QelVidWidget* parent, const QelString& name, QelBaseUnknown* property, bool alternate);
+  QelRovRefinementProperty(QelVidWidget* parent, QelString name, QelBaseUnknown* property, bool alternate);
 
   // Fills the kind's parts: the sub-property rows, or the range combos and values.
   HRESULT BuildContent();
