@@ -100,6 +100,9 @@ class QelVidWidget : public QelISYPIntrospectable {
  protected:
   ~QelVidWidget() override;
   void* QueryDirect(const QelIID& iid) override;
+  // Detaches every child at once, handing them over in order: a layout giving up all its
+  // widgets must not pay a search per widget.
+  std::vector<QelVar<QelVidWidget>> TakeChildren();
   virtual void OnAttributeChanged(const std::string&) {}
 
  private:

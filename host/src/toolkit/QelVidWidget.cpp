@@ -51,6 +51,16 @@ bool QelVidWidget::RemoveChild(QelVidWidget* child) {
   return true;
 }
 
+std::vector<QelVar<QelVidWidget>> QelVidWidget::TakeChildren() {
+  std::vector<QelVar<QelVidWidget>> taken = std::move(children_);
+  children_.clear();
+  for (const auto& child : taken) {
+    child->parent_.Reset();
+    child->parentWidget_ = nullptr;
+  }
+  return taken;
+}
+
 QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
   for (const auto& child : children_) {
     if (child->name_.Str() == name) return child.get();
