@@ -109,6 +109,35 @@ TEST_F(TypeFacet, RefreshChoosesByKindAndRebuildKeepsTheUsersChoice) {
   EXPECT_EQ(Choices(), (std::vector<QelCheckState>{Unchecked, Unchecked, Checked}));
 }
 
+TEST_F(TypeFacet, RefreshRenewsAnnotationRowsInPlaceInTheListedOrderWithStatesReadAgain) {
+  auto* datums = QelSysDynamicCast<QelRovFacetPropertyGroup>(GroupAt(kCustom)->GetPropertyList()[1].get());
+  auto rowAt = [&](int position) { return QelSysDynamicCast<QelRovFacetProperty>(datums->GetPropertyList()[position].get()); };
+  QelRovFacetProperty* rows[] = {rowAt(1), rowAt(2), rowAt(3)};
+  // Rows left in a state a new row would not have, and the previous order reversed, so
+  // the rows must be found by annotation rather than by position.
+  rows[0]->SetVisibleFlag(false);
+  rows[0]->SetFlags(QelRovFacetProperty::FlagsRadio);
+  rows[2]->SetCheckState(PartiallyChecked);
+  auto& list = datums->GetPropertyList();
+  QelListValQelBaseUnknown_var reversed;
+  for (int position = list.Size(); position >= 1; --position) reversed.Append(list[position]);
+  list = reversed;
+  QelModelBuilder::SetShown(a1, false);
+  QelAssertionCapture capture;
+  facet->Refresh();
+  EXPECT_EQ(capture.Count(), 1);  // the odd type code, as on the first pass
+  ASSERT_EQ(datums->GetPropertyList().Size(), 3);
+  for (int position = 1; position <= 3; ++position) EXPECT_EQ(rowAt(position), rows[position - 1]) << position;
+  EXPECT_EQ(KindRows(1), (std::vector<std::string>{"A1", "B1", "B2"}));
+  EXPECT_TRUE(rows[0]->GetVisibleFlag());
+  EXPECT_EQ(rows[0]->GetFlags(), QelRovFacetProperty::FlagsCheckBox);
+  EXPECT_EQ(rows[0]->GetCheckState(), Unchecked);
+  EXPECT_EQ(rows[2]->GetCheckState(), Checked);
+  QelUnicodeString icon;
+  EXPECT_EQ(rows[1]->GetIconName(icon), S_OK);
+  EXPECT_EQ(icon.Utf8().rfind("normal\\", 0), 0u);
+}
+
 TEST_F(TypeFacet, UntickingDefaultOnlyUnderAllShowsEveryAnnotationAgain) {
   EXPECT_EQ(At(kAll)->SetCheck(true), S_OK);
   EXPECT_EQ(At(kDefaultAnnot)->SetCheck(true), S_OK);

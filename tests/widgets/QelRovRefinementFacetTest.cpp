@@ -4,6 +4,7 @@
 #include "QelVidCtlCheckButton.h"
 #include "QelVidCtlExpander.h"
 #include "QelVidSpacer.h"
+#include "QelVidWidgetPrinter.h"
 #include "WidgetTestDoubles.h"
 
 using QelRovRefinementFacetTest = PanelTest;
@@ -107,6 +108,46 @@ TEST_F(QelRovRefinementFacetTest, SubPropertiesGiveANamedExpanderWhoseClickReach
   EXPECT_EQ(rebuiltSecond->GetCheckState(), 1);
   EXPECT_TRUE(dynamic_cast<QelVidCtlExpander*>(rebuiltRow->RetrieveSypNamedObject(QelString("ExpanderProp")))
                   ->GetExpandedState());
+  EXPECT_EQ(capture.Count(), 0);
+}
+
+TEST_F(QelRovRefinementFacetTest, RebuildAfterAClickRenewsRowsInPlaceAndPrintsAsAFreshBuild) {
+  Add("a");
+  auto hidden = Add("b");
+  Add("c", QelRovFacetProperty::FlagsRadio);
+  hidden->SetVisibleFlag(false);
+  auto panel = Make<RebuildingPanel>(std::vector<QelBaseUnknown*>{facet.get()});
+  panel->Rebuild();
+  auto loose = Build();  // made without a parent: never retired, keeps its rows
+  QelRovRefinementFacet* section = panel->FacetWidget(0);
+  QelRovRefinementProperty* before[] = {Row(section, 0), Row(section, 1), Row(section, 2)};
+  before[0]->RetrieveSypNamedObject(QelString("PropertyRow"))->MouseEnter();
+  ASSERT_TRUE(before[0]->IsHovered());
+  hidden->SetVisibleFlag(true);
+
+  auto* box = dynamic_cast<QelVidCtlCheckButton*>(before[0]->RetrieveSypNamedObject(QelString("CheckBox")));
+  ASSERT_NE(box, nullptr);
+  EXPECT_TRUE(box->Click());
+  EXPECT_EQ(panel->rebuilds, 2);
+  QelRovRefinementFacet* rebuilt = panel->FacetWidget(0);
+  ASSERT_NE(rebuilt, section);
+  EXPECT_EQ(Row(rebuilt, 0), before[0]);
+  EXPECT_FALSE(before[0]->IsHovered());
+  EXPECT_NE(Row(rebuilt, 1), before[1]);  // it was hidden: a new row shows it
+  EXPECT_EQ(Row(rebuilt, 2), before[2]);
+  EXPECT_EQ(Row(rebuilt, 1)->IsAlternate(), true);
+  EXPECT_EQ(Row(rebuilt, 2)->IsAlternate(), false);
+  // Texts, states, colours and every attribute as a section made from nothing shows them.
+  auto fresh = Build();
+  EXPECT_EQ(QelVidPrintJson(rebuilt), QelVidPrintJson(fresh.get()));
+  EXPECT_EQ(QelVidPrintText(rebuilt), QelVidPrintText(fresh.get()));
+  EXPECT_EQ(loose->GetGrid()->GetChildCount(), 4);
+
+  // The renewed row answers only to its new section: one click, one rebuild.
+  EXPECT_TRUE(box->Click());
+  EXPECT_EQ(panel->rebuilds, 3);
+  EXPECT_EQ(Row(panel->FacetWidget(0), 0), before[0]);
+  EXPECT_EQ(facet->statesAtApply, (std::vector<QelCheckState>{Checked, Unchecked}));
   EXPECT_EQ(capture.Count(), 0);
 }
 

@@ -2,6 +2,8 @@
 
 #include <string>
 #include <unordered_map>
+#include <utility>
+#include <vector>
 
 #include "QelAnnotationComponents.h"
 #include "QelAssert.h"
@@ -68,6 +70,63 @@ struct TypeIndex {
     std::unordered_map<std::string, QelRovFacetPropertyItemTypeAnnot*> items;
   };
   std::unordered_map<std::string, Group> groups;
+};
+
+// The annotation rows a kind group held before a pass. Passes list the annotations in the
+// same order, so the row for the next annotation is usually the one after the last row
+// renewed; when it is not (annotations came or went), the rows are indexed by annotation
+// once, so a pass stays linear.
+// An annotation row made by this facet, or null; exact class only, without a dynamic cast.
+QelRovFacetPropertyItemCustomAnnot* AnnotationRow(QelBaseUnknown* entry) {
+  QelRovFacetProperty* property = QelRovFacetProperty::From(entry);
+  if (!property || property->GetMetaObject() != &QelRovFacetPropertyItemCustomAnnot::MetaObject()) return nullptr;
+  return static_cast<QelRovFacetPropertyItemCustomAnnot*>(property);
+}
+
+struct PreviousRows {
+  QelListValQelBaseUnknown_var rows;
+  int next = 1;
+  std::unordered_map<QelBaseUnknown*, int> byAnnotation;  // built on the first miss
+  std::vector<bool> used;
+
+  void Take(QelListValQelBaseUnknown_var& from) {
+    std::swap(rows, from);
+    from.RemoveAll();
+  }
+
+  // The renewed row for `annotation`, borrowed (the group it is added to holds it), or null.
+  QelBaseUnknown* Renew(QelBaseUnknown* annotation, QelRovFacetFilterData* filterData) {
+    if (rows.Size() == 0) return nullptr;
+    int position = next;
+    if (position > rows.Size() || !Matches(position, annotation, filterData)) {
+      position = Find(annotation);
+      if (position == 0 || !Matches(position, annotation, filterData)) return nullptr;
+    }
+    if (!used.empty()) used[static_cast<size_t>(position)] = true;
+    next = position + 1;
+    return rows[position].get();
+  }
+
+ private:
+  bool Matches(int position, QelBaseUnknown* annotation, QelRovFacetFilterData* filterData) {
+    if (!used.empty() && used[static_cast<size_t>(position)]) return false;
+    QelRovFacetPropertyItemCustomAnnot* row = AnnotationRow(rows[position].get());
+    return row && row->Renew(annotation, filterData);
+  }
+  int Find(QelBaseUnknown* annotation) {
+    if (used.empty()) {
+      used.assign(static_cast<size_t>(rows.Size()) + 1, false);
+      for (int position = 1; position < next; ++position) used[static_cast<size_t>(position)] = true;
+      byAnnotation.reserve(static_cast<size_t>(rows.Size()));
+      for (int position = 1; position <= rows.Size(); ++position) {
+        QelRovFacetPropertyItemCustomAnnot* row = AnnotationRow(rows[position].get());
+        QelBaseUnknown_var object = row ? row->GetObject() : nullptr;
+        if (object) byAnnotation.emplace(object->GetImpl(), position);
+      }
+    }
+    auto found = byAnnotation.find(annotation->GetImpl());
+    return found == byAnnotation.end() ? 0 : found->second;
+  }
 };
 
 std::string LabelOf(QelRovFacetProperty* property) {
@@ -152,16 +211,19 @@ void QelRovFacetAnnotation::Refresh() {
   if (!defaultAnnot || !tolAnnot) return;
   defaultAnnot->SetCheckState(filterData->DefaultAnnot ? Checked : Unchecked);
   tolAnnot->SetCheckState(filterData->TolAnnot ? Checked : Unchecked);
-  ClearDynamicProperties();
+  ClearTypeRows();
   BuildDynamicProperties(root.get(), filterData);
 }
 
 void QelRovFacetAnnotation::Rebuild() {
-  ClearDynamicProperties();
   QelBaseUnknown_var root;
   QelRovFacetFilterData* filterData = nullptr;
   QelRovFacetGroup::GetRootAndFilterData(FacetGroupRef(), root, filterData);
-  if (!root) return;
+  if (!root) {
+    ClearDynamicProperties();
+    return;
+  }
+  ClearTypeRows();
   BuildDynamicProperties(root.get(), filterData);
 }
 
@@ -177,6 +239,10 @@ HRESULT QelRovFacetAnnotation::BuildTypeProperties(QelBaseUnknown* root, QelRovF
   return BuildTypeRows(root, filterData, nullptr, nullptr);
 }
 
+void QelRovFacetAnnotation::ClearTypeRows() {
+  if (QelRovFacetPropertyGroup* type = PropertyGroupAt(kType)) type->RemoveAllProperties();
+}
+
 HRESULT QelRovFacetAnnotation::BuildKindProperties(QelBaseUnknown* root, QelRovFacetFilterData* filterData) {
   return BuildKindRows(root, filterData, nullptr, nullptr);
 }
@@ -185,6 +251,10 @@ void QelRovFacetAnnotation::ClearDynamicProperties() {
   QelRovFacetPropertyGroup* type = PropertyGroupAt(kType);
   if (!type) return;
   type->RemoveAllProperties();
+  ClearKindRows();
+}
+
+void QelRovFacetAnnotation::ClearKindRows() {
   QelRovFacetPropertyGroup* custom = PropertyGroupAt(kCustom);
   if (!custom) return;
   const QelListValQelBaseUnknown_var& kinds = custom->GetPropertyList();
@@ -292,14 +362,20 @@ HRESULT QelRovFacetAnnotation::BuildKindRows(QelBaseUnknown* root, QelRovFacetFi
     QelAssertBool("7 kind groups");
     return E_UNEXPECTED;
   }
+  // Resolved once: the annotations of a pass land in these seven groups. The rows of the
+  // previous pass are taken out, to be renewed where their annotation comes again.
+  QelRovFacetPropertyGroup* kindGroups[KindCount + 1] = {};
+  PreviousRows previous[KindCount + 1];
+  for (int kindIndex = 1; kindIndex <= KindCount; ++kindIndex) {
+    kindGroups[kindIndex] = QelSysDynamicCast<QelRovFacetPropertyGroup>(kinds[kindIndex].get());
+    if (!kindGroups[kindIndex]) continue;
+    previous[kindIndex].Take(kindGroups[kindIndex]->GetPropertyList());
+    kindGroups[kindIndex]->GetPropertyList().Reserve(previous[kindIndex].rows.Size());
+  }
   QelListValQelBaseUnknown_var own;
   if (!listed) QelRovFacetServices::ListAnnotationsOfVisibleSets(root, own);
   const QelListValQelBaseUnknown_var& annotations = listed ? *listed : own;
   if (annotations.Size() == 0) return S_OK;
-  // Resolved once: the annotations of a pass land in these seven groups.
-  QelRovFacetPropertyGroup* kindGroups[KindCount + 1] = {};
-  for (int kindIndex = 1; kindIndex <= KindCount; ++kindIndex)
-    kindGroups[kindIndex] = QelSysDynamicCast<QelRovFacetPropertyGroup>(kinds[kindIndex].get());
   QelVar<QelITPSTypeClassifier> classifier;
   for (int position = 1; position <= annotations.Size(); ++position) {
     const QelBaseUnknown_var& annotation = annotations[position];
@@ -334,6 +410,10 @@ HRESULT QelRovFacetAnnotation::BuildKindRows(QelBaseUnknown* root, QelRovFacetFi
     QelRovFacetPropertyGroup* kind = kindGroups[kindIndex];
     if (!kind) {
       QelAssertPointer("QelRovFacetPropertyGroup");
+      continue;
+    }
+    if (QelBaseUnknown* renewed = previous[kindIndex].Renew(annotation.get(), filterData)) {
+      kind->AddProperty(renewed);
       continue;
     }
     auto item = QelMakeVar<QelRovFacetPropertyItemCustomAnnot>(annotation.get(), filterData,

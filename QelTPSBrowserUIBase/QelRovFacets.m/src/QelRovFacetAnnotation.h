@@ -3,7 +3,8 @@
 // shown: all of them, by type and sub-type, or by one of seven kinds; a default-annotation
 // switch and a tolerance range refine every choice through the group's filter data.
 // Made and held by the facet group; type groups, type rows and annotation rows live from
-// one build to the next, the five choices and the seven kind groups as long as the facet.
+// one build to the next (an annotation row whose annotation comes again is renewed in
+// place), the five choices and the seven kind groups as long as the facet.
 #include <vector>
 
 #include "QelRovFacet.h"
@@ -38,6 +39,8 @@ class QelRovFacetAnnotation : public QelRovFacet {
 
  private:
   void ClearDynamicProperties();
+  void ClearTypeRows();
+  void ClearKindRows();
   // Both builds over one listing of the visible annotations, the type build telling the
   // kind build which annotations are text or dimension objects: those questions are the
   // dearest of a pass.

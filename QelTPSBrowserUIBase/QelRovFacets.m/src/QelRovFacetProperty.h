@@ -91,6 +91,16 @@ class QelRovFacetProperty : public virtual QelBaseUnknown {
 
   void SetName(QelUnicodeString name) { name_ = std::move(name); }
   void SetIconName(QelUnicodeString iconName) { iconName_ = std::move(iconName); }
+  // The stored texts, without the copy or the name update of the getters.
+  const QelUnicodeString& StoredName() const { return name_; }
+  const QelUnicodeString& StoredIconName() const { return iconName_; }
+  // Back to the presentation a new property has: expanded and visible flags, range mode.
+  void ResetPresentation(int32_t flags) {
+    flags_ = flags;
+    rangeMode_ = 5;
+    expanded_ = false;
+    visible_ = true;
+  }
 
   // Resolves the owner's observer interface, reporting a null handler when it has none.
   QelVar<QelIRovFacetPropertyObserver> ResolveOwnerObserver() const;

@@ -31,6 +31,8 @@ class QelRovFacetPropertyItem : public QelRovFacetProperty {
   ~QelRovFacetPropertyItem() override;
 
   void SetObject(QelBaseUnknown* object) { object_ = QelBaseUnknown_WR(object); }
+  // Whether the item stands for `object`, which is alive.
+  bool StandsFor(QelBaseUnknown* object) const { return object_.RefersTo(object) && object_.IsAlive(); }
   // Stores what IsDisplayEnabled answers for `object` as the check state (S_OK is
   // Checked, S_FALSE Unchecked); a failure (an object of no model) leaves the state as it
   // was. Gives the answer.

@@ -1,5 +1,8 @@
 #include "QelRovRefinementFacet.h"
 
+#include <algorithm>
+#include <vector>
+
 #include "QelAssert.h"
 #include "QelListValQelBaseUnknown_var.h"
 #include "QelRovFacet.h"
@@ -12,6 +15,18 @@
 #include "QelVidGridConstraints.h"
 #include "QelVidLayGrid.h"
 #include "QelVidSpacer.h"
+
+namespace {
+// Sections built inside a parent, by facet, held weakly: the last one over each facet.
+struct BuiltSection {
+  QelBaseUnknown_WR facet;
+  QelBaseUnknown_WR section;
+};
+std::vector<BuiltSection>& BuiltSections() {
+  static std::vector<BuiltSection> sections;
+  return sections;
+}
+}  // namespace
 
 const QelMetaObject& QelRovRefinementFacet::MetaObject() {
   static const QelMetaObject& meta = QelMetaObject::Declare(
@@ -82,6 +97,9 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
   QelSYPEvent* propEvent = QelRovRefinementProperty::SendPropEvent();
   auto forwarder = QelMakeVar<QelSYPWRefMethEventHandler<QelRovRefinementFacet>>(
       this, &QelRovRefinementFacet::ForwardPropertyEvent);
+  forwarder_ = QelVar<QelSYPEventHandler>::Retain(forwarder.get());
+  QelVar<QelSYPEventHandler> oldForwarder;
+  std::vector<QelVar<QelVidWidget>> retired = TakeRetiredRows(hold.get(), oldForwarder);
   int hidden = 0;
   for (int i = 1; i <= n; ++i) {
     QelBaseUnknown* property = properties[i].get();
@@ -89,13 +107,20 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
     const bool alternate = (i - hidden) % 2 == 0;
     rowName.resize(baseLength);
     rowName += std::to_string(i - 1);
-    QelVar<QelRovRefinementProperty> widget =
-        QelMakeVar<QelRovRefinementProperty>(this, QelString(rowName), property, alternate);
-    if (QelFailed(widget->BuildContent())) {
-      QelAssertBool();
-      continue;
+    QelVar<QelRovRefinementProperty> widget;
+    if (static_cast<size_t>(i - 1) < retired.size()) {
+      QelRovRefinementProperty* row = QelRovRefinementProperty::From(retired[static_cast<size_t>(i - 1)].get());
+      if (row && row->Renew(QelString(rowName), property, alternate, oldForwarder.get()))
+        widget = QelVar<QelRovRefinementProperty>::Retain(row);
     }
-    if (QelTkCheckPointer(propEvent, "i_pEvent")) widget->AddHandler(propEvent, forwarder.get(), 0);
+    if (!widget) {
+      widget = QelMakeVar<QelRovRefinementProperty>(this, QelString(rowName), property, alternate);
+      if (QelFailed(widget->BuildContent())) {
+        QelAssertBool();
+        continue;
+      }
+    }
+    if (QelTkCheckPointer(propEvent, "i_pEvent")) widget->AddHandler(propEvent, forwarder_.get(), 0);
     grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
     auto* facetProperty = QelSysDynamicCast<QelRovFacetProperty>(property);
     if (facetProperty && !facetProperty->GetVisibleFlag()) {
@@ -110,6 +135,28 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
   grid_->AddWidget(spacer.get(), QelVidGridConstraints{0, n - 1, 1, 1, 1, 1, 1, 1});
   grid_->SetRowWeight(n - 1, 1.0);
   return S_OK;
+}
+
+std::vector<QelVar<QelVidWidget>> QelRovRefinementFacet::TakeRetiredRows(QelBaseUnknown* facet,
+                                                                         QelVar<QelSYPEventHandler>& forwarder) {
+  std::vector<BuiltSection>& sections = BuiltSections();
+  std::erase_if(sections, [](const BuiltSection& s) { return !s.facet.IsAlive() || !s.section.IsAlive(); });
+  auto mine = std::find_if(sections.begin(), sections.end(), [&](const BuiltSection& s) { return s.facet.RefersTo(facet); });
+  std::vector<QelVar<QelVidWidget>> rows;
+  if (mine != sections.end()) {
+    QelBaseUnknown_var held = mine->section.Get();
+    auto* previous = QelSysDynamicCast<QelRovRefinementFacet>(held.get());
+    if (previous && previous != this && !previous->GetParent() && previous->grid_) {
+      rows = previous->grid_->TakeWidgets();
+      forwarder = previous->forwarder_;
+    }
+  }
+  // A section made without a parent is never retired, so nothing is taken from it.
+  if (GetParent()) {
+    if (mine == sections.end()) mine = sections.insert(sections.end(), {QelBaseUnknown_WR(facet), {}});
+    mine->section = QelBaseUnknown_WR(static_cast<QelBaseUnknown*>(this));
+  }
+  return rows;
 }
 
 QelSYPEvent* QelRovRefinementFacet::SendFacetEvent() {

@@ -38,9 +38,9 @@ const QelMetaObject* QelRovRefinementProperty::GetMetaObject() const { return &M
 
 QelRovRefinementProperty::QelRovRefinementProperty() : QelVidCtl(nullptr, QelString()) {}
 
-QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, const QelString& name,
-                                                   QelBaseUnknown* property, bool alternate)
-    : QelVidCtl(parent, name), property_(property), alternate_(alternate) {
+QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, QelString name, QelBaseUnknown* property,
+                                                   bool alternate)
+    : QelVidCtl(parent, std::move(name)), property_(property), alternate_(alternate) {
   QelBaseUnknown_var hold;
   QelRovFacetProperty* resolved = ResolveProperty(hold);
   if (!resolved) return;
@@ -68,6 +68,29 @@ QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, const Q
 }
 
 QelRovRefinementProperty::~QelRovRefinementProperty() = default;
+
+bool QelRovRefinementProperty::Renew(QelString name, QelBaseUnknown* property, bool alternate,
+                                     QelSYPEventHandler* oldForwarder) {
+  if (kind_ != KindSingleElement || !property || !property_.RefersTo(property) || !GetAttributes().empty() ||
+      !GetLayoutWhenUnvisibleFlag() || GetStyleName().IsEmpty())
+    return false;
+  QelBaseUnknown_var hold;
+  QelRovFacetProperty* resolved = ResolveProperty(hold);
+  if (!resolved || (resolved->GetFlags() & QelRovFacetProperty::FlagValueRange)) return false;
+  QelListValQelBaseUnknown_var children;
+  resolved->GetChildren(children);
+  if (children.Size() > 0 || CountHandlers(SendPropEvent()) != 1) return false;
+  if (!RemoveHandler(SendPropEvent(), oldForwarder)) return false;
+  if (GetName() != name) SetName(std::move(name));
+  resolved->GetName(propertyName_);
+  resolved->IsChecked(checked_);
+  childCount_ = 0;
+  alternate_ = alternate;
+  hovered_ = false;
+  rangeApplied_ = true;
+  DispatchModifyProperty("");
+  return true;
+}
 
 void* QelRovRefinementProperty::QueryDirect(const QelIID& iid) {
   return iid == ClassIID ? this : QelVidCtl::QueryDirect(iid);

@@ -31,10 +31,16 @@ class QelRovRefinementProperty : public QelVidCtl {
 
   // For the introspection meta class: nothing set, no style.
   QelRovRefinementProperty();
-  QelRovRefinementProperty(QelVidWidget* parent, const QelString& name, QelBaseUnknown* property, bool alternate);
+  QelRovRefinementProperty(QelVidWidget* parent, QelString name, QelBaseUnknown* property, bool alternate);
 
   // Fills the kind's parts: the sub-property rows, or the range combos and values.
   HRESULT BuildContent();
+  // Makes this check box or radio row what a new row named `name` over `property` would
+  // be, for a section rebuilt after a change: texts, check state and colours read again,
+  // not hovered, and `oldForwarder` (its one SendPropEvent handler) disconnected. False,
+  // and the row left as it was, when a new row would differ otherwise (another property
+  // or kind, attributes or handlers set on the row since it was made).
+  bool Renew(QelString name, QelBaseUnknown* property, bool alternate, QelSYPEventHandler* oldForwarder);
   // Stores a pending valid range first, asks the property to change its check, then
   // raises SendPropEvent whatever the property answered.
   void SetChecked(int value);

@@ -14,7 +14,14 @@ struct QelIID {
   uint16_t data3 = 0;
   std::array<uint8_t, 8> data4{};
 
-  friend constexpr bool operator==(const QelIID&, const QelIID&) = default;
+  // Written out: queries compare identifiers on every call, and the defaulted form calls
+  // memcmp for the last eight bytes where two identifiers nearly always differ in the first.
+  friend constexpr bool operator==(const QelIID& a, const QelIID& b) {
+    if (a.data1 != b.data1 || a.data2 != b.data2 || a.data3 != b.data3) return false;
+    for (std::size_t i = 0; i < a.data4.size(); ++i)
+      if (a.data4[i] != b.data4[i]) return false;
+    return true;
+  }
   friend constexpr bool operator<(const QelIID& a, const QelIID& b) {
     if (a.data1 != b.data1) return a.data1 < b.data1;
     if (a.data2 != b.data2) return a.data2 < b.data2;

@@ -4,6 +4,7 @@
 // properties to part attributes, routes part events to the control's named handlers and
 // calls OnTemplateApplied before it returns. A sheet or style that cannot be used is
 // reported (file, style and place) and leaves the control without parts.
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -15,7 +16,7 @@ class QelVidCtl : public QelVidWidget {
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override;
 
-  QelVidCtl(QelVidWidget* parent, const QelString& name);
+  QelVidCtl(QelVidWidget* parent, QelString name);
   const char* GetWidgetKind() const override { return "Control"; }
   QelString GetResourceFilename(int level) const override;
 
@@ -31,17 +32,29 @@ class QelVidCtl : public QelVidWidget {
   // to `propertyName`.
   void DispatchModifyProperty(const char* propertyName) override;
 
-  // Used by the style sheet while it instantiates a template.
-  void SetTemplateRoot(QelVidWidget* root);
-  void ReserveTemplate(size_t namedParts, size_t bindings);
-  void AddNamedPart(const std::string& name, QelVidWidget* part);
-  void AddBinding(QelVidWidget* part, const std::string& attribute, const QelSYPMetaClass::Property* property);
-  struct Binding {
-    QelVar<QelVidWidget> part;
-    std::string attribute;
-    const QelSYPMetaClass::Property* property;  // owned by the class's table
+  // What the style sheet keeps of a template for the controls it styles: the parts are
+  // numbered in the order they are made, and names and bindings refer to those numbers.
+  // Shared by every control of one style, so a control holds only its parts.
+  struct TemplateIndex {
+    struct NamedPart {
+      std::string name;
+      size_t part;
+    };
+    struct Binding {
+      size_t part;
+      std::string attribute;
+      const QelSYPMetaClass::Property* property;  // owned by the class's table
+    };
+    size_t partCount = 0;
+    std::vector<NamedPart> namedParts;
+    std::vector<Binding> bindings;  // in the order they are read
   };
-  const std::vector<Binding>& GetBindings() const { return bindings_; }
+  // The index of the applied template (null without one) and its part of that number.
+  const TemplateIndex* GetTemplateIndex() const { return index_.get(); }
+  QelVidWidget* GetTemplatePart(size_t number) const { return number < parts_.size() ? parts_[number].get() : nullptr; }
+  // Used by the style sheet once a template is instantiated: `parts` in the index's order.
+  void SetTemplate(QelVidWidget* root, std::shared_ptr<const TemplateIndex> index,
+                   std::vector<QelVar<QelVidWidget>> parts);
 
  protected:
   ~QelVidCtl() override;
@@ -52,7 +65,7 @@ class QelVidCtl : public QelVidWidget {
   void ClearTemplate();
 
   QelString style_;
-  std::vector<std::pair<std::string, QelVar<QelVidWidget>>> parts_;
-  std::vector<Binding> bindings_;
+  std::shared_ptr<const TemplateIndex> index_;
+  std::vector<QelVar<QelVidWidget>> parts_;
   QelVar<QelVidWidget> templateRoot_;
 };

@@ -17,6 +17,8 @@ class QelVidLayGrid : public QelVidWidget {
   int AddWidget(QelVidWidget* widget, const QelVidGridConstraints& constraints);
   // 0 when the widget is not in the grid.
   int RemoveWidget(QelVidWidget* widget);
+  // Removes every widget at once, handing them over in order of addition; row weights stay.
+  std::vector<QelVar<QelVidWidget>> TakeWidgets();
   // False (and nothing stored) for a negative row.
   bool SetRowWeight(int row, double weight);
   double GetRowWeight(int row) const;

@@ -25,7 +25,7 @@ class QelVidWidget : public QelISYPIntrospectable {
   static const QelMetaObject& MetaObject();
   const QelMetaObject* GetMetaObject() const override;
 
-  QelVidWidget(QelVidWidget* parent, const QelString& name);
+  QelVidWidget(QelVidWidget* parent, QelString name);
 
   // The kind a renderer shows: "Widget", "Frame", "Grid", "Expander" ...
   virtual const char* GetWidgetKind() const { return "Widget"; }
@@ -60,6 +60,9 @@ class QelVidWidget : public QelISYPIntrospectable {
   // Room for `count` attributes, for a maker that knows how many it will set: rows of
   // styled parts then carry no unused slots.
   void ReserveAttributes(size_t count) { attributes_.reserve(count); }
+  // A new part's attributes from its template, with room for `more` (its bindings). Each
+  // is announced as SetAttribute would; the names are distinct.
+  void InitAttributes(const std::vector<std::pair<std::string, QelSYPValue>>& initial, size_t more);
   QelSYPValue GetAttribute(const std::string& name) const;
   int IntAttribute(const std::string& name, int fallback) const;
   QelUnicodeString TextAttribute(const std::string& name) const;
@@ -97,13 +100,22 @@ class QelVidWidget : public QelISYPIntrospectable {
  protected:
   ~QelVidWidget() override;
   void* QueryDirect(const QelIID& iid) override;
+  // Detaches every child at once, handing them over in order: a layout giving up all its
+  // widgets must not pay a search per widget.
+  std::vector<QelVar<QelVidWidget>> TakeChildren();
   virtual void OnAttributeChanged(const std::string&) {}
 
  private:
   struct Connection {
-    QelSYPEvent* event;
+    QelSYPEvent* event = nullptr;
     QelVar<QelSYPEventHandler> handler;
   };
+  // In order of connection: the widget's own slots first, then the overflow.
+  template <class Visit>
+  void ForEachConnection(Visit&& visit) const {
+    for (size_t i = 0; i < ownConnectionCount_; ++i) visit(ownConnections_[i]);
+    for (const Connection& c : moreConnections_) visit(c);
+  }
 
   QelString name_;
   QelBaseUnknown_WR parent_;
@@ -113,7 +125,12 @@ class QelVidWidget : public QelISYPIntrospectable {
   // A few per widget: a flat list is cheaper to build than a tree.
   Attributes attributes_;
   const QelSYPValue* FindAttribute(const std::string& name) const;
-  std::vector<Connection> connections_;
+  // A styled part has one or two handlers: those live in the widget, without a list of
+  // their own.
+  static constexpr size_t kOwnConnections = 2;
+  Connection ownConnections_[kOwnConnections];
+  size_t ownConnectionCount_ = 0;
+  std::vector<Connection> moreConnections_;
   QelVidPoint minimum_;
   bool layoutWhenUnvisible_ = true;
 };

@@ -120,6 +120,11 @@ QelUnicodeString::QelUnicodeString(std::string_view utf8)
 
 bool QelUnicodeString::IsValidUtf8(std::string_view bytes) {
   for (size_t at = 0; at < bytes.size();) {
+    // Names are mostly ASCII: every text handed out is checked, so keep that path short.
+    if (static_cast<unsigned char>(bytes[at]) < 0x80) {
+      ++at;
+      continue;
+    }
     size_t length = SequenceLength(bytes, at);
     if (length == 0) return false;
     at += length;

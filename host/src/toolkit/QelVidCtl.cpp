@@ -9,7 +9,7 @@ const QelMetaObject& QelVidCtl::MetaObject() {
 }
 const QelMetaObject* QelVidCtl::GetMetaObject() const { return &MetaObject(); }
 
-QelVidCtl::QelVidCtl(QelVidWidget* parent, const QelString& name) : QelVidWidget(parent, name) {}
+QelVidCtl::QelVidCtl(QelVidWidget* parent, QelString name) : QelVidWidget(parent, std::move(name)) {}
 
 QelVidCtl::~QelVidCtl() = default;
 
@@ -35,44 +35,33 @@ HRESULT QelVidCtl::SetCustomStyle(const QelString& sheet, const QelString& style
 }
 
 QelVidWidget* QelVidCtl::RetrieveSypNamedObject(const QelString& name) const {
-  for (const auto& [partName, part] : parts_)
-    if (partName == name.Str()) return part.get();
+  if (!index_) return nullptr;
+  for (const TemplateIndex::NamedPart& named : index_->namedParts)
+    if (named.name == name.Str()) return parts_[named.part].get();
   return nullptr;
 }
 
 void QelVidCtl::DispatchModifyProperty(const char* propertyName) {
+  if (!index_) return;
   const bool all = !propertyName || !*propertyName;
-  for (const Binding& binding : bindings_) {
+  for (const TemplateIndex::Binding& binding : index_->bindings) {
     if (!all && binding.property->name != propertyName) continue;
     QelSYPValue value;
-    if (QelSYPMetaClass::Read(this, *binding.property, value)) binding.part->SetAttribute(binding.attribute, value);
+    if (QelSYPMetaClass::Read(this, *binding.property, value)) parts_[binding.part]->SetAttribute(binding.attribute, value);
   }
 }
 
-void QelVidCtl::SetTemplateRoot(QelVidWidget* root) {
-  if (!root) return;
+void QelVidCtl::SetTemplate(QelVidWidget* root, std::shared_ptr<const TemplateIndex> index,
+                            std::vector<QelVar<QelVidWidget>> parts) {
+  if (!root || !index || parts.size() != index->partCount) return;
+  index_ = std::move(index);
+  parts_ = std::move(parts);
   templateRoot_ = QelVar<QelVidWidget>::Retain(root);
   AddChild(root);
 }
 
-void QelVidCtl::ReserveTemplate(size_t namedParts, size_t bindings) {
-  parts_.reserve(parts_.size() + namedParts);
-  bindings_.reserve(bindings_.size() + bindings);
-}
-
-void QelVidCtl::AddNamedPart(const std::string& name, QelVidWidget* part) {
-  if (parts_.empty()) parts_.reserve(8);
-  if (part) parts_.emplace_back(name, QelVar<QelVidWidget>::Retain(part));
-}
-
-void QelVidCtl::AddBinding(QelVidWidget* part, const std::string& attribute,
-                           const QelSYPMetaClass::Property* property) {
-  if (bindings_.empty()) bindings_.reserve(8);
-  if (part && property) bindings_.push_back({QelVar<QelVidWidget>::Retain(part), attribute, property});
-}
-
 void QelVidCtl::ClearTemplate() {
-  bindings_.clear();
+  index_ = nullptr;
   parts_.clear();
   if (templateRoot_) RemoveChild(templateRoot_.get());
   templateRoot_ = nullptr;

@@ -18,6 +18,11 @@ int QelVidLayGrid::RemoveWidget(QelVidWidget* widget) {
   return 1;
 }
 
+std::vector<QelVar<QelVidWidget>> QelVidLayGrid::TakeWidgets() {
+  cells_.clear();
+  return TakeChildren();
+}
+
 bool QelVidLayGrid::SetRowWeight(int row, double weight) {
   if (row < 0) return false;
   weights_[row] = weight;

@@ -59,11 +59,15 @@ struct QelVidCompiledPart {
   std::vector<std::optional<QelVidGridConstraints>> cells;  // for a Grid's children
   std::unique_ptr<QelVidCompiledPart> header;
   std::unique_ptr<QelVidCompiledPart> body;
-  // Whole-template totals, kept on the root only: a control reserves for them once.
+  size_t number = 0;  // in the order parts are made: the part, its header, body, children
+  // Kept on the root only: what every control of the style shares.
   size_t handlerSlots = 0;
-  size_t routeCount = 0;
-  size_t namedParts = 0;
-  size_t bindingCount = 0;
+  struct NumberedRoute {
+    size_t part;
+    const Route* route;
+  };
+  std::vector<NumberedRoute> allRoutes;
+  std::shared_ptr<QelVidCtl::TemplateIndex> index;
 };
 
 // Orders (style, class) keys and lets a look-up use the style name as it comes, without
@@ -179,12 +183,11 @@ class TemplateCompiler {
   TemplateCompiler(const std::string& className, const QelSYPMetaClass* meta) : className_(className), meta_(meta) {}
 
   // The template's root, with the totals of the whole tree.
-  QelVidCompiledPart CompileTemplate(const json& node, const std::string& place) {
-    QelVidCompiledPart root = Compile(node, place);
-    root.handlerSlots = handlerNames_.size();
-    root.routeCount = routeCount_;
-    root.namedParts = namedParts_;
-    root.bindingCount = bindingCount_;
+  std::shared_ptr<QelVidCompiledPart> CompileTemplate(const json& node, const std::string& place) {
+    auto root = std::make_shared<QelVidCompiledPart>(Compile(node, place));
+    root->handlerSlots = handlerNames_.size();
+    root->index = std::make_shared<QelVidCtl::TemplateIndex>();
+    Number(*root, *root);
     return root;
   }
 
@@ -210,7 +213,6 @@ class TemplateCompiler {
     QelVar<QelVidWidget> sample = part.make ? part.make(part.name) : nullptr;
     if (!sample) throw StyleError{place + "/kind", "unknown kind \"" + part.kind + "\""};
     if (!name.empty()) {
-      ++namedParts_;
       if (std::find(names_.begin(), names_.end(), name) != names_.end())
         throw StyleError{place + "/name", "the part name \"" + name + "\" is used twice"};
       names_.push_back(name);
@@ -227,6 +229,19 @@ class TemplateCompiler {
   }
 
  private:
+  // Numbers the parts in the order BuildParts makes them, and lists names, bindings and
+  // routes by those numbers.
+  static void Number(QelVidCompiledPart& part, QelVidCompiledPart& root) {
+    QelVidCtl::TemplateIndex& index = *root.index;
+    part.number = index.partCount++;
+    if (!part.name.IsEmpty()) index.namedParts.push_back({part.name.Str(), part.number});
+    for (const auto& binding : part.bindings) index.bindings.push_back({part.number, binding.attribute, binding.property});
+    for (const auto& route : part.routes) root.allRoutes.push_back({part.number, &route});
+    if (part.header) Number(*part.header, root);
+    if (part.body) Number(*part.body, root);
+    for (QelVidCompiledPart& child : part.children) Number(child, root);
+  }
+
   void NeedMeta(const std::string& place) const {
     if (!meta_) throw StyleError{place, "the class " + className_ + " has no introspection table"};
   }
@@ -242,7 +257,6 @@ class TemplateCompiler {
         throw StyleError{at, "the class " + meta_->GetClassName() + " has no property \"" +
                                  property.get<std::string>() + "\""};
       part.bindings.push_back({attribute, found});
-      ++bindingCount_;
     }
   }
 
@@ -262,7 +276,6 @@ class TemplateCompiler {
       auto slot = std::find(handlerNames_.begin(), handlerNames_.end(), handlerName);
       if (slot == handlerNames_.end()) slot = handlerNames_.insert(handlerNames_.end(), handlerName);
       part.routes.push_back({event, handlerName, static_cast<size_t>(slot - handlerNames_.begin())});
-      ++routeCount_;
     }
   }
 
@@ -312,42 +325,33 @@ class TemplateCompiler {
   const QelSYPMetaClass* meta_;
   std::vector<std::string> names_;
   std::vector<std::string> handlerNames_;
-  size_t namedParts_ = 0;
-  size_t bindingCount_ = 0;
-  size_t routeCount_ = 0;
 };
 
 // The one handler of a styled control: it serves every route of the control's template,
-// knowing per routed part and event which handler name to call, and makes the handler of
-// a name the first time one of its events comes. Rows that are never clicked or hovered
-// thus cost one counted object instead of one per handler name. It holds the control
-// weakly, like the handlers it makes.
+// finding the route of an event by the part that raised it, and makes the handler of a
+// name the first time one of its events comes. Rows that are never clicked or hovered
+// thus cost one small counted object instead of one per handler name. It holds the
+// control weakly, like the handlers it makes.
 class QelVidRouteHandler final : public QelSYPEventHandler {
  public:
   QelVidRouteHandler(QelVidCtl* control, const QelSYPMetaClass* meta,
                      std::shared_ptr<const QelVidCompiledPart> compiled)
-      : control_(static_cast<QelBaseUnknown*>(control)),
-        meta_(meta),
-        compiled_(std::move(compiled)),
-        handlers_(compiled_->handlerSlots) {
-    routes_.reserve(compiled_->routeCount);
-  }
-
-  void AddRoute(QelVidWidget* part, const QelVidCompiledPart::Route& route) {
-    routes_.push_back({part, route.event, &route});
-  }
+      : control_(static_cast<QelBaseUnknown*>(control)), meta_(meta), compiled_(std::move(compiled)) {}
 
   void HandleEvent(QelVidWidget* current, QelBaseUnknown* args) override {
     auto* eventArgs = dynamic_cast<QelSYPEventArgs*>(args);
     QelSYPEvent* event = eventArgs ? eventArgs->GetEvent() : nullptr;
-    for (const Entry& entry : routes_) {
-      if (entry.part != current || entry.event != event) continue;
-      Slot& slot = handlers_[entry.route->slot];
+    QelBaseUnknown_var held = control_.Get();
+    auto* control = dynamic_cast<QelVidCtl*>(held.get());
+    // A control styled again has other parts: this router's routes no longer apply.
+    if (!control || control->GetTemplateIndex() != compiled_->index.get()) return;
+    for (const QelVidCompiledPart::NumberedRoute& numbered : compiled_->allRoutes) {
+      if (numbered.route->event != event || control->GetTemplatePart(numbered.part) != current) continue;
+      if (handlers_.empty()) handlers_.resize(compiled_->handlerSlots);
+      Slot& slot = handlers_[numbered.route->slot];
       if (!slot.made) {
-        QelBaseUnknown_var control = control_.Get();
-        if (!control) return;
         slot.made = true;
-        slot.handler = QelVar<QelSYPEventHandler>::Adopt(meta_->CreateHandler(control.get(), entry.route->handler));
+        slot.handler = QelVar<QelSYPEventHandler>::Adopt(meta_->CreateHandler(held.get(), numbered.route->handler));
       }
       // Held: the handler may rebuild the control, and with it this router's owners.
       if (QelVar<QelSYPEventHandler> handler = slot.handler) handler->HandleEvent(current, args);
@@ -359,11 +363,6 @@ class QelVidRouteHandler final : public QelSYPEventHandler {
   ~QelVidRouteHandler() override = default;
 
  private:
-  struct Entry {
-    QelVidWidget* part;  // a part of the control, which holds this router: never dangling here
-    QelSYPEvent* event;
-    const QelVidCompiledPart::Route* route;  // in compiled_
-  };
   struct Slot {
     bool made = false;
     QelVar<QelSYPEventHandler> handler;
@@ -372,34 +371,28 @@ class QelVidRouteHandler final : public QelSYPEventHandler {
   QelBaseUnknown_WR control_;
   const QelSYPMetaClass* meta_;
   std::shared_ptr<const QelVidCompiledPart> compiled_;
-  std::vector<Entry> routes_;
-  std::vector<Slot> handlers_;
+  std::vector<Slot> handlers_;  // one per handler name, made with the first event
 };
 
-// Makes the widgets of a compiled template for `control`.
-QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, QelVidCtl* control, const QelSYPMetaClass* meta,
+// Makes the widgets of a compiled template for a control, each at its number in `parts`.
+QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, std::vector<QelVar<QelVidWidget>>& parts,
                                 QelVidRouteHandler* router) {
   QelVar<QelVidWidget> part = compiled.make(compiled.name);
-  if (!compiled.name.IsEmpty()) control->AddNamedPart(compiled.name.Str(), part.get());
-  part->ReserveAttributes(compiled.attributes.size() + compiled.bindings.size());
-  for (const auto& [attribute, value] : compiled.attributes) part->SetAttribute(attribute, value);
-  for (const auto& binding : compiled.bindings) control->AddBinding(part.get(), binding.attribute, binding.property);
-  for (const auto& route : compiled.routes) {
-    router->AddRoute(part.get(), route);
-    part->AddHandler(route.event, router, 0);
-  }
+  parts[compiled.number] = part;
+  part->InitAttributes(compiled.attributes, compiled.bindings.size());
+  for (const auto& route : compiled.routes) part->AddHandler(route.event, router, 0);
   // Only an expander has a header or a body, and only a part with children may be a grid:
   // leaves, most parts of a row, need no cast.
   if (compiled.header || compiled.body) {
     if (auto* expander = dynamic_cast<QelVidCtlExpander*>(part.get())) {
-      if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, control, meta, router).get());
-      if (compiled.body) expander->SetBody(BuildParts(*compiled.body, control, meta, router).get());
+      if (compiled.header) expander->SetHeader(BuildParts(*compiled.header, parts, router).get());
+      if (compiled.body) expander->SetBody(BuildParts(*compiled.body, parts, router).get());
     }
   }
   if (compiled.children.empty()) return part;
   auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
   for (size_t i = 0; i < compiled.children.size(); ++i) {
-    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], control, meta, router);
+    QelVar<QelVidWidget> child = BuildParts(compiled.children[i], parts, router);
     if (grid && compiled.cells[i]) grid->AddWidget(child.get(), *compiled.cells[i]);
     else part->AddChild(child.get());
   }
@@ -492,8 +485,7 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
       if (!it->is_object() || !it->contains("template"))
         throw StyleError{"/styles/" + style, "a style is an object with a \"template\""};
       TemplateCompiler compiler(control->IsA(), meta);
-      compiled = std::make_shared<QelVidCompiledPart>(
-          compiler.CompileTemplate((*it)["template"], "/styles/" + style + "/template"));
+      compiled = compiler.CompileTemplate((*it)["template"], "/styles/" + style + "/template");
     } catch (const StyleError& e) {
       document_->compiled.erase({style, meta});
       Report("style sheet " + path_ + ": style \"" + style + "\": at " + e.place + ": " + e.what);
@@ -505,11 +497,11 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
     }
   }
   std::shared_ptr<const QelVidCompiledPart> held = compiled;  // the map may change below
-  control->ReserveTemplate(held->namedParts, held->bindingCount);
   QelVar<QelVidRouteHandler> router;
-  if (held->routeCount > 0) router = QelMakeVar<QelVidRouteHandler>(control, meta, held);
-  QelVar<QelVidWidget> root = BuildParts(*held, control, meta, router.get());
-  control->SetTemplateRoot(root.get());
+  if (!held->allRoutes.empty()) router = QelMakeVar<QelVidRouteHandler>(control, meta, held);
+  std::vector<QelVar<QelVidWidget>> parts(held->index->partCount);
+  QelVar<QelVidWidget> root = BuildParts(*held, parts, router.get());
+  control->SetTemplate(root.get(), held->index, std::move(parts));
   return S_OK;
 }
 

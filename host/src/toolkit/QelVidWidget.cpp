@@ -14,8 +14,8 @@ const QelMetaObject& QelVidWidget::MetaObject() {
 }
 const QelMetaObject* QelVidWidget::GetMetaObject() const { return &MetaObject(); }
 
-QelVidWidget::QelVidWidget(QelVidWidget* parent, const QelString& name)
-    : name_(name), parent_(parent), parentWidget_(parent) {}
+QelVidWidget::QelVidWidget(QelVidWidget* parent, QelString name)
+    : name_(std::move(name)), parent_(parent), parentWidget_(parent) {}
 
 QelVidWidget::~QelVidWidget() = default;
 
@@ -51,6 +51,16 @@ bool QelVidWidget::RemoveChild(QelVidWidget* child) {
   return true;
 }
 
+std::vector<QelVar<QelVidWidget>> QelVidWidget::TakeChildren() {
+  std::vector<QelVar<QelVidWidget>> taken = std::move(children_);
+  children_.clear();
+  for (const auto& child : taken) {
+    child->parent_.Reset();
+    child->parentWidget_ = nullptr;
+  }
+  return taken;
+}
+
 QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
   for (const auto& child : children_) {
     if (child->name_.Str() == name) return child.get();
@@ -66,6 +76,16 @@ void QelVidWidget::SetAttribute(const std::string& name, const QelSYPValue& valu
   if (it == attributes_.end()) attributes_.emplace_back(name, value);
   else it->second = value;
   OnAttributeChanged(name);
+}
+
+void QelVidWidget::InitAttributes(const std::vector<std::pair<std::string, QelSYPValue>>& initial, size_t more) {
+  if (!attributes_.empty()) {
+    for (const auto& [name, value] : initial) SetAttribute(name, value);
+    return;
+  }
+  attributes_.reserve(initial.size() + more);
+  attributes_.insert(attributes_.end(), initial.begin(), initial.end());
+  for (const auto& attribute : initial) OnAttributeChanged(attribute.first);
 }
 
 const QelSYPValue* QelVidWidget::FindAttribute(const std::string& name) const {
@@ -118,22 +138,38 @@ QelSYPEvent* QelVidWidget::FindEvent(const std::string& name) const {
 
 int QelVidWidget::AddHandler(QelSYPEvent* event, QelSYPEventHandler* handler, int) {
   if (!event || !handler) return 0;
-  if (connections_.empty()) connections_.reserve(2);
-  connections_.push_back({event, QelVar<QelSYPEventHandler>::Retain(handler)});
+  Connection added{event, QelVar<QelSYPEventHandler>::Retain(handler)};
+  if (ownConnectionCount_ < kOwnConnections && moreConnections_.empty())
+    ownConnections_[ownConnectionCount_++] = std::move(added);
+  else
+    moreConnections_.push_back(std::move(added));
   return 1;
 }
 
 int QelVidWidget::RemoveHandler(QelSYPEvent* event, QelSYPEventHandler* handler) {
-  auto it = std::find_if(connections_.begin(), connections_.end(),
-                         [&](const Connection& c) { return c.event == event && c.handler.get() == handler; });
-  if (it == connections_.end()) return 0;
-  connections_.erase(it);
+  auto matches = [&](const Connection& c) { return c.event == event && c.handler.get() == handler; };
+  for (size_t i = 0; i < ownConnectionCount_; ++i) {
+    if (!matches(ownConnections_[i])) continue;
+    // Keep the order: close the gap, then refill the last own slot from the overflow.
+    Connection leaving = std::move(ownConnections_[i]);
+    for (size_t j = i + 1; j < ownConnectionCount_; ++j) ownConnections_[j - 1] = std::move(ownConnections_[j]);
+    --ownConnectionCount_;
+    if (!moreConnections_.empty()) {
+      ownConnections_[ownConnectionCount_++] = std::move(moreConnections_.front());
+      moreConnections_.erase(moreConnections_.begin());
+    }
+    return 1;
+  }
+  auto it = std::find_if(moreConnections_.begin(), moreConnections_.end(), matches);
+  if (it == moreConnections_.end()) return 0;
+  moreConnections_.erase(it);
   return 1;
 }
 
 int QelVidWidget::CountHandlers(QelSYPEvent* event) const {
-  return static_cast<int>(
-      std::count_if(connections_.begin(), connections_.end(), [event](const Connection& c) { return c.event == event; }));
+  int count = 0;
+  ForEachConnection([&](const Connection& c) { count += c.event == event ? 1 : 0; });
+  return count;
 }
 
 bool QelVidWidget::Dispatch(QelSYPEventArgs* args) {
@@ -147,8 +183,9 @@ bool QelVidWidget::Dispatch(QelSYPEventArgs* args) {
   for (const auto& widget : route) {
     // A snapshot, so handlers added or removed by a handler do not disturb this pass.
     std::vector<QelVar<QelSYPEventHandler>> handlers;
-    for (const Connection& c : widget->connections_)
+    widget->ForEachConnection([&](const Connection& c) {
       if (c.event == event) handlers.push_back(c.handler);
+    });
     for (const auto& handler : handlers) handler->HandleEvent(widget.get(), args);
   }
   return true;
