@@ -7,7 +7,7 @@ packages=(cmake ninja-build g++ pkg-config googletest libgtest-dev libgmock-dev 
           nlohmann-json3-dev libpng-dev libedit-dev libfreetype-dev fonts-dejavu-core libassimp-dev
           libegl-dev libegl-mesa0 libgl1-mesa-dri
           libocct-foundation-dev libocct-modeling-data-dev libocct-modeling-algorithms-dev libocct-ocaf-dev
-          libocct-data-exchange-dev)
+          libocct-data-exchange-dev libcpp-httplib-dev)
 for option in "$@"; do
   case "$option" in
     --fuzz) packages+=(clang libclang-rt-dev) ;;
