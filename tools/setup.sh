@@ -8,7 +8,7 @@ packages=(cmake ninja-build g++ pkg-config googletest libgtest-dev libgmock-dev 
           nlohmann-json3-dev libpng-dev libedit-dev libfreetype-dev fonts-dejavu-core libassimp-dev
           libegl-dev libegl-mesa0 libgl1-mesa-dri
           libocct-foundation-dev libocct-modeling-data-dev libocct-modeling-algorithms-dev libocct-ocaf-dev
-          libocct-data-exchange-dev chromium)
+          libocct-data-exchange-dev libcpp-httplib-dev chromium)
 # A machine that already has node (with its npm) keeps it.
 command -v node >/dev/null && command -v npm >/dev/null || packages+=(nodejs npm)
 for option in "$@"; do

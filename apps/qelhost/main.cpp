@@ -18,6 +18,7 @@
 #include "QelHostOptions.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
+#include "QelHostWebServer.h"
 #include "QelModelLoader.h"
 #include "QelModelPrinter.h"
 #include "QelModuleLoader.h"
@@ -208,10 +209,14 @@ int main(int argc, char** argv) {
     return 0;
   }
   std::printf("model %s\n", options.modelPath.empty() ? kQelSampleProductName : options.modelPath.c_str());
-  if (!LoadPlugin(options)) return 1;
+  void* module = LoadPlugin(options);
+  if (!module) return 1;
   if (!HandleSettings(options.settings)) return 1;
   if (!ApplyDisplayChanges(root.get(), options.displayChanges)) return 1;
   if (options.defaultOnly || options.tolerance) ApplyFilter(root.get(), options);
+  if (options.serve)
+    return QelHostWebServer::Serve(std::move(root), options.modelPath.empty() ? kQelSampleProductName : options.modelPath,
+                                   options.port, module);
   std::cout << '\n';
   QelModelPrinter::Print(root.get(), std::cout);
   return RunSession(root, options);

@@ -94,8 +94,9 @@ nlohmann::json ValueJson(const QelSYPValue& value) {
   return nullptr;
 }
 
-nlohmann::json WidgetJson(QelVidWidget* w) {
+nlohmann::json WidgetJson(QelVidWidget* w, const std::string& id) {
   nlohmann::json node;
+  node["id"] = id;
   node["kind"] = w->GetWidgetKind();
   node["class"] = w->IsA();
   node["name"] = w->GetName().Str();
@@ -115,8 +116,10 @@ nlohmann::json WidgetJson(QelVidWidget* w) {
   }
   auto* grid = dynamic_cast<QelVidLayGrid*>(w);
   nlohmann::json children = nlohmann::json::array();
-  for (QelVidWidget* child : ChildrenInOrder(w)) {
-    nlohmann::json c = WidgetJson(child);
+  const std::vector<QelVidWidget*> inOrder = ChildrenInOrder(w);
+  for (size_t i = 0; i < inOrder.size(); ++i) {
+    QelVidWidget* child = inOrder[i];
+    nlohmann::json c = WidgetJson(child, id + "." + std::to_string(i));
     QelVidGridConstraints cell;
     if (grid && grid->GetConstraints(child, cell)) {
       c["row"] = cell.row;
@@ -138,5 +141,23 @@ std::string QelVidPrintText(QelVidWidget* root) {
 
 std::string QelVidPrintJson(QelVidWidget* root, int indent) {
   if (!root) return "null";
-  return WidgetJson(root).dump(indent);
+  return WidgetJson(root, "0").dump(indent);
+}
+
+QelVidWidget* QelVidFindById(QelVidWidget* root, std::string_view id) {
+  if (!root || id.substr(0, 1) != "0") return nullptr;
+  QelVidWidget* w = root;
+  for (id.remove_prefix(1); !id.empty();) {
+    if (id[0] != '.') return nullptr;
+    id.remove_prefix(1);
+    size_t index = 0, digits = 0;
+    for (; digits < id.size() && digits < 9 && id[digits] >= '0' && id[digits] <= '9'; ++digits)
+      index = index * 10 + static_cast<size_t>(id[digits] - '0');
+    if (digits == 0 || (digits > 1 && id[0] == '0')) return nullptr;
+    id.remove_prefix(digits);
+    const std::vector<QelVidWidget*> children = ChildrenInOrder(w);
+    if (index >= children.size()) return nullptr;
+    w = children[index];
+  }
+  return w;
 }
