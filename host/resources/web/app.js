@@ -95,6 +95,7 @@
     if (changes && changes.hidden && changes.hidden.length) parts.push(`Hidden: ${list(changes.hidden)}`);
     if (changes && changes.shown && changes.shown.length) parts.push(`Shown: ${list(changes.shown)}`);
     $('changes').textContent = parts.join(' — ');
+    $('changes').title = parts.join('\n');
   }
 
   // ---- the panel ------------------------------------------------------------------------
@@ -400,13 +401,18 @@
         button.type = 'button';
         button.dataset.item = String(item.item);
         button.setAttribute('aria-pressed', String(view.activeItem === item.item));
-        const thumb = el('img', 'thumb');
-        thumb.alt = '';
-        thumb.loading = 'lazy';
-        thumb.decoding = 'async';
-        thumb.width = 144;
-        thumb.height = 108;
-        thumb.src = item.thumbnail;
+        let thumb;
+        if (item.thumbnail) {
+          thumb = el('img', 'thumb');
+          thumb.alt = '';
+          thumb.loading = 'lazy';
+          thumb.decoding = 'async';
+          thumb.width = 112;
+          thumb.height = 84;
+          thumb.src = item.thumbnail;
+        } else {
+          thumb = el('span', 'thumb none', 'No preview');
+        }
         const words = el('span', 'item-text');
         words.appendChild(el('span', 'item-name', item.name));
         words.appendChild(el('span', 'item-kind', item.kind === 'capture' ? 'Capture' : 'View'));
