@@ -13,6 +13,7 @@ const [qelhost, generator, outputDir = process.cwd()] = process.argv.slice(2);
 const chromiumPath = '/usr/bin/chromium';
 const scratch = mkdtempSync(path.join(tmpdir(), 'qel-web-review-'));
 const servers = [];
+const pageErrors = [];
 let context = null;
 
 function fail(message) {
@@ -26,6 +27,7 @@ async function step(name, body) {
     console.log(`ok - ${name}`);
   } catch (error) {
     error.message = `step "${name}" failed: ${error.message}`;
+    if (pageErrors.length) error.message += `\nthe page's script failed: ${pageErrors.join('; ')}`;
     throw error;
   }
 }
@@ -123,8 +125,7 @@ async function expandRow(page, text) {
 }
 
 async function reviewSample(page, url) {
-  const errors = [];
-  page.on('pageerror', (error) => errors.push(error.message));
+  page.on('pageerror', (error) => pageErrors.push(error.message));
 
   await step('the page loads with the panel and a picture', async () => {
     await page.goto(url);
@@ -215,7 +216,7 @@ async function reviewSample(page, url) {
     console.log(`screenshot: ${file}`);
   });
 
-  if (errors.length) fail(`the page reported errors: ${errors.join('; ')}`);
+  if (pageErrors.length) fail(`the page's script failed: ${pageErrors.join('; ')}`);
 }
 
 // Click to updated panel and picture, at 10k annotations: a figure for the notes, never a

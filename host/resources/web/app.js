@@ -10,6 +10,28 @@
   // The host answered the first visit with a cookie; the token need not stay on screen.
   if (token) history.replaceState(null, '', location.pathname);
 
+  // The page's own words (the panel's and the browser's come from the host's catalogs).
+  const words = {
+    notDone: (reason) => `Not done: ${reason}`,
+    counts: (shown, hidden) => `${shown} shown · ${hidden} hidden`,
+    more: (names, rest) => `${names} and ${rest} more`,
+    hidden: (names) => `Hidden: ${names}`,
+    shown: (names) => `Shown: ${names}`,
+    expand: (row) => `Expand ${row}`,
+    collapse: (row) => `Collapse ${row}`,
+    noPanel: 'No panel is open.',
+    noItems: 'No views or captures to browse.',
+    noPreview: 'No preview',
+    capture: 'Capture',
+    view: 'View',
+    noJson: 'the host answered something that is not JSON',
+    noPicture: 'the picture could not be loaded',
+    parts: {
+      LeftEditor: 'lower value', LeftCombo: 'lower operator',
+      RightCombo: 'upper operator', RightEditor: 'upper value', RangeButton: 'apply the range',
+    },
+  };
+
   const view = {
     panelText: '',      // last panel JSON drawn, to skip rebuilds that change nothing
     browserText: '',
@@ -41,7 +63,7 @@
       const reason = data && data.error ? data.error : text.trim() || response.statusText;
       throw new Error(`${response.status}: ${reason}`);
     }
-    if (!data) throw new Error('the host answered something that is not JSON');
+    if (!data) throw new Error(words.noJson);
     return data;
   }
 
@@ -51,7 +73,14 @@
   function post(path, body) {
     waiting += 1;
     document.body.setAttribute('aria-busy', 'true');
-    const run = queue.then(() => request(path, body)).then(apply, showError).finally(() => {
+    // Resolves true once the answer is drawn, false when the host refused the request.
+    const run = queue.then(() => request(path, body)).then((state) => {
+      apply(state);
+      return true;
+    }, (error) => {
+      showError(error);
+      return false;
+    }).finally(() => {
       waiting -= 1;
       if (waiting === 0) document.body.removeAttribute('aria-busy');
     });
@@ -65,7 +94,7 @@
 
   function showError(error) {
     const status = $('status');
-    status.textContent = `Not done: ${error.message}`;
+    status.textContent = words.notDone(error.message);
     status.classList.add('error');
   }
 
@@ -88,12 +117,12 @@
 
   function drawDisplay(display, changes) {
     $('display-summary').textContent = display
-      ? `${display.shown} shown · ${display.hidden} hidden` : '';
+      ? words.counts(display.shown, display.hidden) : '';
     const parts = [];
     const list = (names) => (names.length > 6
-      ? `${names.slice(0, 6).join(', ')} and ${names.length - 6} more` : names.join(', '));
-    if (changes && changes.hidden && changes.hidden.length) parts.push(`Hidden: ${list(changes.hidden)}`);
-    if (changes && changes.shown && changes.shown.length) parts.push(`Shown: ${list(changes.shown)}`);
+      ? words.more(names.slice(0, 6).join(', '), names.length - 6) : names.join(', '));
+    if (changes && changes.hidden && changes.hidden.length) parts.push(words.hidden(list(changes.hidden)));
+    if (changes && changes.shown && changes.shown.length) parts.push(words.shown(list(changes.shown)));
     $('changes').textContent = parts.join(' — ');
     $('changes').title = parts.join('\n');
   }
@@ -111,12 +140,6 @@
   function isShaded(color) {
     return Array.isArray(color) && color[3] > 0 && !(color[0] === 255 && color[1] === 255 && color[2] === 255);
   }
-
-  // What a part of a range row is, for a screen reader that cannot see its place.
-  const partNames = {
-    LeftEditor: 'lower value', LeftCombo: 'lower operator',
-    RightCombo: 'upper operator', RightEditor: 'upper value', RangeButton: 'apply the range',
-  };
 
   // Icons are names; the page draws a few known ones as small marks and leaves the rest out.
   function drawIcon(name) {
@@ -168,7 +191,7 @@
         const button = el('button', 'button', text);
         button.type = 'button';
         button.disabled = off;
-        if (context.row && partNames[node.name]) button.setAttribute('aria-label', `${context.row}: ${partNames[node.name]}`);
+        if (context.row && words.parts[node.name]) button.setAttribute('aria-label', `${context.row}: ${words.parts[node.name]}`);
         button.addEventListener('click', () => sendEvent(node.id, 'click'));
         return button;
       }
@@ -202,7 +225,7 @@
         });
         select.selectedIndex = node.selectedIndex;
         select.disabled = off;
-        select.setAttribute('aria-label', context.row ? `${context.row}: ${partNames[node.name] || node.name}` : node.name);
+        select.setAttribute('aria-label', context.row ? `${context.row}: ${words.parts[node.name] || node.name}` : node.name);
         select.addEventListener('change', () => {
           const index = select.selectedIndex;
           select.selectedIndex = node.selectedIndex;
@@ -265,7 +288,7 @@
     input.value = node.attributes.text || '';
     input.disabled = off;
     input.size = 6;
-    input.setAttribute('aria-label', context.row ? `${context.row}: ${partNames[node.name] || node.name}` : node.name);
+    input.setAttribute('aria-label', context.row ? `${context.row}: ${words.parts[node.name] || node.name}` : node.name);
     const sent = input.value;
     const commit = () => {
       if (input.value === sent) return;
@@ -299,7 +322,7 @@
     const title = node.attributes.text || '';
     if (header) {
       const headerDom = drawWidget(header, off, context);
-      toggle.setAttribute('aria-label', `${expanded ? 'Collapse' : 'Expand'} ${rowText(header)}`.trim());
+      toggle.setAttribute('aria-label', (expanded ? words.collapse : words.expand)(rowText(header)).trim());
       head.appendChild(toggle);
       if (headerDom) head.appendChild(headerDom);
       if (headerDom && headerDom.classList.contains('shaded')) head.classList.add('shaded');
@@ -347,8 +370,8 @@
     const typing = focused && focused.matches('input.editor') && focused.value !== focused.dataset.sent
       ? { value: focused.value, start: focused.selectionStart, end: focused.selectionEnd } : null;
 
-    const root = panel ? drawWidget(panel, false, {}) : el('p', 'empty', 'No panel is open.');
-    host.replaceChildren(root || el('p', 'empty', 'No panel is open.'));
+    const root = panel ? drawWidget(panel, false, {}) : el('p', 'empty', words.noPanel);
+    host.replaceChildren(root || el('p', 'empty', words.noPanel));
     // The containers above the scrolled area share the pane's height, so only the rows scroll.
     for (let node = host.querySelector('.scroll'); node && node !== host; node = node.parentElement) {
       node.classList.add('fill');
@@ -387,7 +410,7 @@
     view.browserText = text;
     const host = $('browser');
     if (!browser || !browser.nodes || browser.nodes.length === 0) {
-      host.replaceChildren(el('p', 'empty', 'No views or captures to browse.'));
+      host.replaceChildren(el('p', 'empty', words.noItems));
       return;
     }
     const columns = browser.columns || [];
@@ -411,18 +434,18 @@
           thumb.height = 84;
           thumb.src = item.thumbnail;
         } else {
-          thumb = el('span', 'thumb none', 'No preview');
+          thumb = el('span', 'thumb none', words.noPreview);
         }
-        const words = el('span', 'item-text');
-        words.appendChild(el('span', 'item-name', item.name));
-        words.appendChild(el('span', 'item-kind', item.kind === 'capture' ? 'Capture' : 'View'));
+        const about = el('span', 'item-text');
+        about.appendChild(el('span', 'item-name', item.name));
+        about.appendChild(el('span', 'item-kind', item.kind === 'capture' ? words.capture : words.view));
         if (item.description) {
           const description = el('span', 'item-description');
           if (columns[1]) description.appendChild(el('span', 'column', `${columns[1]}: `));
           description.appendChild(document.createTextNode(item.description));
-          words.appendChild(description);
+          about.appendChild(description);
         }
-        button.append(thumb, words);
+        button.append(thumb, about);
         button.addEventListener('click', () => activate(item.item));
         entry.appendChild(button);
         list.appendChild(entry);
@@ -434,7 +457,8 @@
   }
 
   function activate(item) {
-    return post('/api/activate', { item }).then(() => {
+    return post('/api/activate', { item }).then((done) => {
+      if (!done) return;
       view.activeItem = item;
       $('browser').querySelectorAll('button.item').forEach((b) => {
         b.setAttribute('aria-pressed', String(b.dataset.item === String(item)));
@@ -467,7 +491,7 @@
     next.onerror = () => {
       if (view.pictureWanted !== url) return;
       document.body.dataset.picture = 'failed';
-      showError(new Error('the picture could not be loaded'));
+      showError(new Error(words.noPicture));
     };
     next.src = url;
   }
