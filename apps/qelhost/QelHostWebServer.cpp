@@ -184,7 +184,12 @@ bool QelHostWebServer::Start(int port, std::string& error) {
     error = "cannot listen on " + std::string(kLoopback) + ":" + std::to_string(port) + " (in use?)";
     return false;
   }
-  listener_ = std::thread([this] { http_->listen_after_bind(); });
+  listener_ = std::thread([this] {
+    http_->listen_after_bind();
+    listenerDone_ = true;
+  });
+  // A stop asked before the listener runs would be lost, and it would accept forever.
+  while (!http_->is_running() && !listenerDone_) std::this_thread::sleep_for(std::chrono::milliseconds(1));
   return true;
 }
 

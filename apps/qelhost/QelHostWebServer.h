@@ -4,6 +4,7 @@
 // and queue every API call as a job for the UI thread, then wait for its reply: they never
 // touch a host object. Run is the UI thread's loop; it returns once the stop flag is set,
 // which a signal handler may do. Stop (or the destructor) ends the HTTP threads.
+#include <atomic>
 #include <condition_variable>
 #include <csignal>
 #include <deque>
@@ -66,6 +67,7 @@ class QelHostWebServer {
   int port_ = 0;
   std::unique_ptr<httplib::Server> http_;
   std::thread listener_;
+  std::atomic<bool> listenerDone_{false};
 
   std::mutex mutex_;
   std::condition_variable wake_;  // a job was queued
