@@ -33,7 +33,6 @@
   };
 
   const view = {
-    panelText: '',      // last panel JSON drawn, to skip rebuilds that change nothing
     browserText: '',
     picture: '',        // picture address from the last State, without the size
     pictureWanted: '',  // full address of the newest picture asked for
@@ -69,13 +68,15 @@
 
   let queue = Promise.resolve();
   let waiting = 0;
-  // Every change goes through here, so two clicks can never overtake each other.
-  function post(path, body) {
+  // Every change goes through here, so two clicks can never overtake each other. Camera
+  // moves and scrolls leave the widgets as they were: their answers skip the panel's rebuild,
+  // which at 10k annotations would cost more than comparing the panel's JSON.
+  function post(path, body, keepPanel = false) {
     waiting += 1;
     document.body.setAttribute('aria-busy', 'true');
     // Resolves true once the answer is drawn, false when the host refused the request.
     const run = queue.then(() => request(path, body)).then((state) => {
-      apply(state);
+      apply(state, keepPanel);
       return true;
     }, (error) => {
       showError(error);
@@ -100,10 +101,10 @@
 
   // ---- State ----------------------------------------------------------------------------
 
-  function apply(state) {
+  function apply(state, keepPanel = false) {
     $('status').classList.remove('error');
     $('status').textContent = '';
-    drawPanel(state.panel);
+    if (!keepPanel) drawPanel(state.panel);
     drawBrowser(state.browser);
     drawDisplay(state.display, state.changes);
     if (state.picture && state.picture !== view.picture) {
@@ -352,14 +353,11 @@
     if (area.dataset.restoring) return;
     clearTimeout(scrollTimer);
     scrollTimer = setTimeout(() => {
-      sendEvent(id, 'scroll', { x: Math.round(area.scrollLeft), y: Math.round(area.scrollTop) });
+      post('/api/event', { id, type: 'scroll', x: Math.round(area.scrollLeft), y: Math.round(area.scrollTop) }, true);
     }, 400);
   }
 
   function drawPanel(panel) {
-    const text = JSON.stringify(panel);
-    if (text === view.panelText) return;
-    view.panelText = text;
     const host = $('panel');
     // What the person was doing survives the rebuild: scroll offsets, focus, a half-typed entry.
     const scrolls = new Map();
@@ -512,7 +510,7 @@
     }
     if (!body) return;
     camera.busy = true;
-    post('/api/camera', body).finally(() => {
+    post('/api/camera', body, true).finally(() => {
       camera.busy = false;
       flushCamera();
     });
@@ -568,7 +566,7 @@
     });
     $('zoom-in').addEventListener('click', () => zoom(1.25));
     $('zoom-out').addEventListener('click', () => zoom(0.8));
-    $('reframe').addEventListener('click', () => post('/api/camera', { reframe: true }));
+    $('reframe').addEventListener('click', () => post('/api/camera', { reframe: true }, true));
     let resizeTimer = 0;
     new ResizeObserver(() => {
       clearTimeout(resizeTimer);
