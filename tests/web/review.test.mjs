@@ -208,7 +208,14 @@ async function reviewSample(page, url) {
     if (after.counts === before.counts) fail(`the counts stayed "${after.counts}"`);
   });
 
+  await step('Reframe brings the whole product back into the picture', async () => {
+    const address = await page.locator('#picture').getAttribute('src');
+    await settled(page, () => page.getByRole('button', { name: 'Reframe' }).click());
+    if (await page.locator('#picture').getAttribute('src') === address) fail('the picture address did not change');
+  });
+
   await step('a screenshot is saved', async () => {
+    await page.mouse.move(0, 0);
     await page.waitForFunction(() => [...document.querySelectorAll('#browser img')]
       .every((img) => img.complete), null, { timeout: 30000 });
     const file = path.join(outputDir, 'web-review.png');
