@@ -37,6 +37,7 @@
     picture: '',        // picture address from the last State, without the size
     pictureWanted: '',  // full address of the newest picture asked for
     activeItem: null,
+    rebuilding: false,  // true while the panel's old widgets are being replaced
     serial: 0,          // States applied so far, for tests and measurements
   };
 
@@ -277,7 +278,6 @@
     const caption = frame.querySelector(':scope > label.label');
     if (caption) caption.classList.add('caption');
     if (input && caption) caption.htmlFor = input.id;
-    frame.querySelector(':scope > .editor, :scope > .combo')?.classList.add('range-start');
   }
 
   function drawEditor(node, off, context) {
@@ -290,22 +290,26 @@
     input.disabled = off;
     input.size = 6;
     input.setAttribute('aria-label', context.row ? `${context.row}: ${words.parts[node.name] || node.name}` : node.name);
-    const sent = input.value;
+    const shown = input.value;
+    let sent = shown;
+    // An entry goes once: Enter then Tab, or a rebuild removing the box, sends nothing more.
     const commit = () => {
-      if (input.value === sent) return;
-      const text = input.value;
-      sendEvent(node.id, 'text', { text });
+      if (input.value === sent || !input.isConnected || view.rebuilding) return;
+      sent = input.value;
+      delete input.dataset.typing;
+      sendEvent(node.id, 'text', { text: sent });
     };
+    input.addEventListener('input', () => { input.dataset.typing = '1'; });
     input.addEventListener('keydown', (event) => {
       if (event.key === 'Enter') {
         event.preventDefault();
         commit();
       } else if (event.key === 'Escape') {
-        input.value = sent;
+        input.value = shown;
+        delete input.dataset.typing;
       }
     });
     input.addEventListener('blur', commit);
-    input.dataset.sent = sent;
     return input;
   }
 
@@ -365,11 +369,13 @@
     const focused = document.activeElement && host.contains(document.activeElement) ? document.activeElement : null;
     const focusId = focused ? focused.closest('[data-wid]')?.dataset.wid : null;
     const focusToggle = focused ? focused.classList.contains('toggle') : false;
-    const typing = focused && focused.matches('input.editor') && focused.value !== focused.dataset.sent
+    const typing = focused && focused.matches('input.editor') && focused.dataset.typing
       ? { value: focused.value, start: focused.selectionStart, end: focused.selectionEnd } : null;
 
     const root = panel ? drawWidget(panel, false, {}) : el('p', 'empty', words.noPanel);
+    view.rebuilding = true;
     host.replaceChildren(root || el('p', 'empty', words.noPanel));
+    view.rebuilding = false;
     // The containers above the scrolled area share the pane's height, so only the rows scroll.
     for (let node = host.querySelector('.scroll'); node && node !== host; node = node.parentElement) {
       node.classList.add('fill');
@@ -394,6 +400,7 @@
         target.focus({ preventScroll: true });
         if (typing && target.matches('input.editor')) {
           target.value = typing.value;
+          target.dataset.typing = '1';
           target.setSelectionRange(typing.start, typing.end);
         }
       }
