@@ -7,7 +7,14 @@ import { spawn, execFileSync } from 'node:child_process';
 import { existsSync, mkdtempSync, rmSync } from 'node:fs';
 import { tmpdir } from 'node:os';
 import path from 'node:path';
-import { chromium } from 'playwright-core';
+
+let chromium;
+try {
+  ({ chromium } = await import('playwright-core'));
+} catch {
+  console.error('web review: playwright-core is not installed in tests/web: run tools/setup.sh');
+  process.exit(1);
+}
 
 const [qelhost, generator, outputDir = process.cwd()] = process.argv.slice(2);
 const chromiumPath = '/usr/bin/chromium';
