@@ -41,7 +41,7 @@ constexpr double kPi = 3.14159265358979323846;
 std::string Dump(const json& value) { return value.dump(-1, ' ', false, json::error_handler_t::replace); }
 
 QelHostWebReply Error(int status, const std::string& message) {
-  return {status, "application/json", Dump(json{{"error", message}})};
+  return {status, kQelJsonType, Dump(json{{"error", message}})};
 }
 
 bool IsShown(QelBaseUnknown* object) { return QelRovFacetServices::IsDisplayEnabled(object) == S_OK; }

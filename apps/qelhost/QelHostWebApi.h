@@ -17,9 +17,13 @@
 class QelDbrBrowser;
 class QelHostSession;
 
+// With its parameter, so the HTTP library does not compress the answer: its brotli
+// compression at full quality takes seconds on a large panel, far more than loopback saves.
+inline constexpr const char* kQelJsonType = "application/json; charset=utf-8";
+
 struct QelHostWebReply {
   int status = 200;
-  std::string contentType = "application/json";
+  std::string contentType = kQelJsonType;
   std::string body;
 };
 

@@ -197,7 +197,7 @@ QelHostWebReply QelHostWebServer::OnUiThread(std::function<QelHostWebReply()> wo
   auto job = std::make_shared<Job>();
   job->work = std::move(work);
   std::unique_lock lock(mutex_);
-  if (stopping_) return {503, "application/json", R"({"error":"qelhost is stopping"})"};
+  if (stopping_) return {503, kQelJsonType, R"({"error":"qelhost is stopping"})"};
   jobs_.push_back(job);
   wake_.notify_one();
   done_.wait(lock, [&] { return job->done; });
@@ -217,7 +217,7 @@ void QelHostWebServer::Run(const volatile std::sig_atomic_t& stop) {
       try {
         reply = job->work();
       } catch (const std::exception& e) {
-        reply = {500, "application/json", nlohmann::json{{"error", std::string("internal error: ") + e.what()}}.dump()};
+        reply = {500, kQelJsonType, nlohmann::json{{"error", std::string("internal error: ") + e.what()}}.dump()};
       }
       lock.lock();
       job->reply = std::move(reply);
@@ -232,7 +232,7 @@ void QelHostWebServer::Stop() {
     std::lock_guard lock(mutex_);
     stopping_ = true;
     for (const auto& job : jobs_) {
-      job->reply = {503, "application/json", R"({"error":"qelhost is stopping"})"};
+      job->reply = {503, kQelJsonType, R"({"error":"qelhost is stopping"})"};
       job->done = true;
     }
     jobs_.clear();

@@ -106,7 +106,7 @@ nlohmann::json WidgetJson(QelVidWidget* w, const std::string& id) {
   nlohmann::json attributes = nlohmann::json::object();
   for (const auto& [name, value] : w->GetAttributes())
     if (name != "visible" && name != "enabled") attributes[name] = ValueJson(value);
-  node["attributes"] = attributes;
+  node["attributes"] = std::move(attributes);
   if (auto* expander = dynamic_cast<QelVidCtlExpander*>(w)) node["expanded"] = expander->GetExpandedState();
   if (auto* combo = dynamic_cast<QelVidCtlImageAndLabelCombo*>(w)) {
     nlohmann::json lines = nlohmann::json::array();
@@ -128,7 +128,8 @@ nlohmann::json WidgetJson(QelVidWidget* w, const std::string& id) {
     }
     children.push_back(std::move(c));
   }
-  node["children"] = children;
+  // Moved, not copied: a copy at every level costs the depth times the tree's size.
+  node["children"] = std::move(children);
   return node;
 }
 }  // namespace
