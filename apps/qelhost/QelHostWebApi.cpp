@@ -196,12 +196,14 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
   QelDbrFraPanel* panel = QelHostPanel::Find(session_.Editor());
   json question = question_ ? json{{"title", question_->title}, {"message", question_->message}} : json(nullptr);
   QelHostWebReply reply;
-  reply.body = "{\"panel\":" + (panel ? QelVidPrintJson(panel, -1) : std::string("null")) +
-               ",\"browser\":" + BrowserJson() +
-               ",\"changes\":" + Dump(json{{"shown", changes.shown}, {"hidden", changes.hidden}}) +
-               ",\"display\":" + Dump(json{{"shown", shown}, {"hidden", hidden}}) +
-               ",\"picture\":\"/api/picture.png?v=" + std::to_string(version_) + "\"" +
-               ",\"question\":" + Dump(question) + "}";
+  std::string& body = reply.body;
+  body = "{\"panel\":";
+  QelVidAppendJson(panel, body);  // most of the answer: written in place, never copied
+  body += ",\"browser\":" + BrowserJson();
+  body += ",\"changes\":" + Dump(json{{"shown", changes.shown}, {"hidden", changes.hidden}});
+  body += ",\"display\":" + Dump(json{{"shown", shown}, {"hidden", hidden}});
+  body += ",\"picture\":\"/api/picture.png?v=" + std::to_string(version_) + "\"";
+  body += ",\"question\":" + Dump(question) + "}";
   return reply;
 }
 

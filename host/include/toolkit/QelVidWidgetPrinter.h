@@ -14,5 +14,7 @@ class QelVidWidget;
 std::string QelVidPrintText(QelVidWidget* root);
 // indent -1: the compact form.
 std::string QelVidPrintJson(QelVidWidget* root, int indent = 2);
+// The compact form appended to `out`, for an answer that holds the tree among other things.
+void QelVidAppendJson(QelVidWidget* root, std::string& out);
 // The widget at `id` under `root`, or null for a malformed id or a path that leads nowhere.
 QelVidWidget* QelVidFindById(QelVidWidget* root, std::string_view id);
