@@ -1,13 +1,16 @@
 #!/usr/bin/env bash
 # Installs what the build, the tests and the benchmarks need on a Debian machine; with
-# --fuzz also clang and libFuzzer's runtime, for the `fuzz` preset.
-# Runs apt-get only when something is missing, so it is cheap to call every time.
+# --fuzz also clang and libFuzzer's runtime, for the `fuzz` preset. The web review's
+# browser test gets chromium and, in tests/web, its locked npm packages.
+# Runs apt-get and npm only when something is missing, so it is cheap to call every time.
 set -euo pipefail
 packages=(cmake ninja-build g++ pkg-config googletest libgtest-dev libgmock-dev libbenchmark-dev
           nlohmann-json3-dev libpng-dev libedit-dev libfreetype-dev fonts-dejavu-core libassimp-dev
           libegl-dev libegl-mesa0 libgl1-mesa-dri
           libocct-foundation-dev libocct-modeling-data-dev libocct-modeling-algorithms-dev libocct-ocaf-dev
-          libocct-data-exchange-dev)
+          libocct-data-exchange-dev libcpp-httplib-dev chromium)
+# A machine that already has node (with its npm) keeps it.
+command -v node >/dev/null && command -v npm >/dev/null || packages+=(nodejs npm)
 for option in "$@"; do
   case "$option" in
     --fuzz) packages+=(clang libclang-rt-dev) ;;
@@ -24,4 +27,9 @@ if [ ${#missing[@]} -gt 0 ]; then
   [ "$(id -u)" -eq 0 ] || SUDO="sudo"
   $SUDO apt-get update -qq
   DEBIAN_FRONTEND=noninteractive $SUDO apt-get install -y -qq "${missing[@]}"
+fi
+web_tests="$(cd "$(dirname "$0")/../tests/web" && pwd)"
+if [ ! -d "$web_tests/node_modules" ]; then
+  echo "setup: installing the browser test's npm packages"
+  (cd "$web_tests" && npm ci --no-audit --no-fund --loglevel=error)
 fi

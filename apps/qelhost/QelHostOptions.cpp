@@ -27,10 +27,12 @@ bool ParseSettingRequest(const std::string& text, QelHostOptions::SettingRequest
 
 const char* QelHostOptions::Usage() {
   return "usage: qelhost [options] [model.json]\n"
+         "       qelhost serve [--port N] [options] [model.json]\n"
          "\n"
          "Opens a product model (the shipped sample when none is given), loads the\n"
          "QelRovFacets plug-in and shows the model's annotation sets, annotations, views\n"
-         "and captures with the shown or hidden state of each.\n"
+         "and captures with the shown or hidden state of each. With serve, the review is a\n"
+         "web page on this machine only: open the address qelhost prints.\n"
          "\n"
          "options:\n"
          "  --hide NAME          hide the product, set, annotation, view or capture NAME\n"
@@ -46,6 +48,7 @@ const char* QelHostOptions::Usage() {
          "  --demo               run a short scripted review of the model with the panel\n"
          "  --setting REPO/KEY[=VALUE]\n"
          "                       print a user setting, or write and save it\n"
+         "  --port N             with serve: the port of the review page (default: a free one)\n"
          "  -h, --help           show this help and exit\n"
          "  -V, --version        show the version and exit\n";
 }
@@ -118,7 +121,22 @@ bool QelHostOptions::Parse(const std::vector<std::string>& args, QelHostOptions&
       return true;
     };
     std::string text;
-    if (arg == "-h" || arg == "--help") {
+    if (arg == "serve" && i == 0) {
+      options.serve = true;
+    } else if (arg == "--port") {
+      if (!value(text)) return false;
+      char* end = nullptr;
+      const long port = std::strtol(text.c_str(), &end, 10);
+      if (text.empty() || *end != '\0' || port < 0 || port > 65535) {
+        error = "--port '" + text + "': give a port from 0 to 65535";
+        return false;
+      }
+      options.port = static_cast<int>(port);
+      if (!options.serve) {
+        error = "--port is for qelhost serve";
+        return false;
+      }
+    } else if (arg == "-h" || arg == "--help") {
       options.action = Action::Help;
       return true;
     } else if (arg == "-V" || arg == "--version") {
@@ -172,6 +190,10 @@ bool QelHostOptions::Parse(const std::vector<std::string>& args, QelHostOptions&
     } else {
       options.modelPath = arg;
     }
+  }
+  if (options.serve && (options.demo || !options.scriptPath.empty() || !options.exportJsonPath.empty())) {
+    error = "serve runs no script, demo or export";
+    return false;
   }
   return true;
 }

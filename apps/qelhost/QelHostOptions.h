@@ -38,6 +38,8 @@ struct QelHostOptions {
   bool defaultOnly = false;
   std::optional<QelToleranceRange> tolerance;
   std::vector<SettingRequest> settings;
+  bool serve = false;  // `serve`: the review page on 127.0.0.1 instead of a session
+  int port = 0;        // with serve; 0 picks a free port
 
   // False with `error` (one line naming the argument) when the command line is refused.
   static bool Parse(const std::vector<std::string>& args, QelHostOptions& options, std::string& error);

@@ -19,6 +19,7 @@
 #include "QelHostPlugin.h"
 #include "QelHostPictures.h"
 #include "QelHostSession.h"
+#include "QelHostWebServer.h"
 #include "QelModelLoader.h"
 #include "QelModelPrinter.h"
 #include "QelRovFacetFilterData.h"
@@ -201,6 +202,12 @@ int main(int argc, char** argv) {
   if (!HandleSettings(options.settings)) return 1;
   if (!ApplyDisplayChanges(root.get(), options.displayChanges)) return 1;
   if (options.defaultOnly || options.tolerance) ApplyFilter(root.get(), options);
+  if (options.serve) {
+    // Serve takes the model and lets it go before it returns, so the plug-in can go after it.
+    const int status = QelHostWebServer::Serve(
+        std::move(root), options.modelPath.empty() ? kQelSampleProductName : options.modelPath, options.port, module);
+    return QelHostPlugin::Unload(module, options.modulePath, objectsBefore, std::cout) ? status : 1;
+  }
   std::cout << '\n';
   QelModelPrinter::Print(root.get(), std::cout);
   const int status = RunSession(root, options, module);

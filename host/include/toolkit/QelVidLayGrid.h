@@ -3,6 +3,7 @@
 // constraints, and a weight per row: free height goes to the rows with weight. A row
 // takes room when one of its widgets does (see QelVidWidget::TakesRoom).
 #include <map>
+#include <utility>
 #include <vector>
 
 #include "QelVidGridConstraints.h"
@@ -32,6 +33,8 @@ class QelVidLayGrid : public QelVidWidget {
   bool GetConstraints(QelVidWidget* widget, QelVidGridConstraints& constraints) const;
   // All widgets sorted by row, then column, then order of addition.
   std::vector<QelVidWidget*> GetWidgetsInOrder() const;
+  // The same, each with its constraints (one pass, where GetConstraints per widget is a search).
+  std::vector<std::pair<QelVidWidget*, QelVidGridConstraints>> GetCellsInOrder() const;
 
  protected:
   ~QelVidLayGrid() override = default;

@@ -63,13 +63,20 @@ bool QelVidLayGrid::GetConstraints(QelVidWidget* widget, QelVidGridConstraints& 
 }
 
 std::vector<QelVidWidget*> QelVidLayGrid::GetWidgetsInOrder() const {
+  std::vector<QelVidWidget*> out;
+  for (const auto& [widget, constraints] : GetCellsInOrder()) out.push_back(widget);
+  return out;
+}
+
+std::vector<std::pair<QelVidWidget*, QelVidGridConstraints>> QelVidLayGrid::GetCellsInOrder() const {
   std::vector<const Cell*> sorted;
   for (const Cell& c : cells_) sorted.push_back(&c);
   std::stable_sort(sorted.begin(), sorted.end(), [](const Cell* a, const Cell* b) {
     if (a->constraints.row != b->constraints.row) return a->constraints.row < b->constraints.row;
     return a->constraints.column < b->constraints.column;
   });
-  std::vector<QelVidWidget*> out;
-  for (const Cell* c : sorted) out.push_back(c->widget);
+  std::vector<std::pair<QelVidWidget*, QelVidGridConstraints>> out;
+  out.reserve(sorted.size());
+  for (const Cell* c : sorted) out.emplace_back(c->widget, c->constraints);
   return out;
 }

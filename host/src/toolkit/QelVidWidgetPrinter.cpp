@@ -1,6 +1,9 @@
 #include "QelVidWidgetPrinter.h"
 
+#include <charconv>
+#include <cmath>
 #include <nlohmann/json.hpp>
+#include <string_view>
 
 #include "QelVidCtlButton.h"
 #include "QelVidCtlCheckButton.h"
@@ -86,47 +89,153 @@ void Walk(QelVidWidget* w, int indent, std::string& out) {
   for (QelVidWidget* child : ChildrenInOrder(w)) Walk(child, indent, out);
 }
 
-nlohmann::json ValueJson(const QelSYPValue& value) {
-  if (const int* i = std::get_if<int>(&value)) return *i;
-  if (const double* d = std::get_if<double>(&value)) return *d;
-  if (const auto* s = std::get_if<QelUnicodeString>(&value)) return s->Utf8();
-  if (const auto* c = std::get_if<QelVidColor>(&value)) return {c->Red(), c->Green(), c->Blue(), c->Alpha()};
-  return nullptr;
+// The JSON form is written straight into one text: a panel of a large model has tens of
+// thousands of widgets, and a tree of JSON values first would cost several times more.
+void AppendText(std::string& out, std::string_view text) {
+  static constexpr char kHex[] = "0123456789abcdef";
+  out += '"';
+  for (size_t i = 0; i < text.size();) {
+    const auto c = static_cast<unsigned char>(text[i]);
+    if (c >= 0x80) {
+      // A well-formed UTF-8 sequence is kept; any other byte becomes U+FFFD.
+      const size_t length = c >= 0xF0 && c <= 0xF4 ? 4 : c >= 0xE0 ? 3 : c >= 0xC2 && c < 0xE0 ? 2 : 0;
+      bool whole = length > 0 && i + length <= text.size();
+      for (size_t k = 1; whole && k < length; ++k) whole = (static_cast<unsigned char>(text[i + k]) & 0xC0) == 0x80;
+      if (whole && length == 3) {
+        const auto second = static_cast<unsigned char>(text[i + 1]);
+        whole = !(c == 0xE0 && second < 0xA0) && !(c == 0xED && second >= 0xA0);
+      }
+      if (whole && length == 4) {
+        const auto second = static_cast<unsigned char>(text[i + 1]);
+        whole = !(c == 0xF0 && second < 0x90) && !(c == 0xF4 && second >= 0x90);
+      }
+      if (whole) {
+        out.append(text.substr(i, length));
+        i += length;
+      } else {
+        out += "\xEF\xBF\xBD";
+        ++i;
+      }
+      continue;
+    }
+    if (c == '"' || c == '\\') {
+      out += '\\';
+      out += char(c);
+    } else if (c == '\n') {
+      out += "\\n";
+    } else if (c == '\t') {
+      out += "\\t";
+    } else if (c < 0x20) {
+      out += "\\u00";
+      out += kHex[c >> 4];
+      out += kHex[c & 0xF];
+    } else {
+      out += char(c);
+    }
+    ++i;
+  }
+  out += '"';
 }
 
-nlohmann::json WidgetJson(QelVidWidget* w) {
-  nlohmann::json node;
-  node["kind"] = w->GetWidgetKind();
-  node["class"] = w->IsA();
-  node["name"] = w->GetName().Str();
-  node["visible"] = w->GetVisibleFlag() != 0;
-  node["takesRoom"] = w->TakesRoom();
-  node["enabled"] = w->IsEnabled() != 0;
-  nlohmann::json attributes = nlohmann::json::object();
-  for (const auto& [name, value] : w->GetAttributes())
-    if (name != "visible" && name != "enabled") attributes[name] = ValueJson(value);
-  node["attributes"] = attributes;
-  if (auto* expander = dynamic_cast<QelVidCtlExpander*>(w)) node["expanded"] = expander->GetExpandedState();
+void AppendNumber(std::string& out, double value) {
+  if (!std::isfinite(value)) {
+    out += "null";
+    return;
+  }
+  char text[32];
+  const auto written = std::to_chars(text, text + sizeof text, value);
+  out.append(text, written.ptr);
+}
+
+void AppendValue(std::string& out, const QelSYPValue& value) {
+  if (const int* i = std::get_if<int>(&value)) {
+    out += std::to_string(*i);
+  } else if (const double* d = std::get_if<double>(&value)) {
+    AppendNumber(out, *d);
+  } else if (const auto* s = std::get_if<QelUnicodeString>(&value)) {
+    AppendText(out, s->Utf8());
+  } else if (const auto* c = std::get_if<QelVidColor>(&value)) {
+    out += '[' + std::to_string(c->Red()) + ',' + std::to_string(c->Green()) + ',' + std::to_string(c->Blue()) + ',' +
+           std::to_string(c->Alpha()) + ']';
+  } else {
+    out += "null";
+  }
+}
+
+void AppendWidget(QelVidWidget* w, std::string& id, std::string& out, const QelVidGridConstraints* cell,
+                  double rowWeight) {
+  auto key = [&out](const char* name) {
+    out += ",\"";
+    out += name;
+    out += "\":";
+  };
+  out += "{\"id\":";
+  AppendText(out, id);
+  key("kind");
+  AppendText(out, w->GetWidgetKind());
+  key("class");
+  AppendText(out, w->IsA());
+  key("name");
+  AppendText(out, w->GetName().Str());
+  key("visible");
+  out += w->GetVisibleFlag() ? "true" : "false";
+  key("takesRoom");
+  out += w->TakesRoom() ? "true" : "false";
+  key("enabled");
+  out += w->IsEnabled() ? "true" : "false";
+  key("attributes");
+  out += '{';
+  bool first = true;
+  for (const auto& [name, value] : w->GetAttributes()) {
+    if (name == "visible" || name == "enabled") continue;
+    if (!first) out += ',';
+    first = false;
+    AppendText(out, name);
+    out += ':';
+    AppendValue(out, value);
+  }
+  out += '}';
+  if (auto* expander = dynamic_cast<QelVidCtlExpander*>(w)) {
+    key("expanded");
+    out += expander->GetExpandedState() ? "true" : "false";
+  }
   if (auto* combo = dynamic_cast<QelVidCtlImageAndLabelCombo*>(w)) {
-    nlohmann::json lines = nlohmann::json::array();
-    for (int i = 0; i < combo->GetLineCount(); ++i) lines.push_back(combo->GetLine(i).Utf8());
-    node["lines"] = lines;
-    node["selectedIndex"] = combo->GetSelectedIndex();
-  }
-  auto* grid = dynamic_cast<QelVidLayGrid*>(w);
-  nlohmann::json children = nlohmann::json::array();
-  for (QelVidWidget* child : ChildrenInOrder(w)) {
-    nlohmann::json c = WidgetJson(child);
-    QelVidGridConstraints cell;
-    if (grid && grid->GetConstraints(child, cell)) {
-      c["row"] = cell.row;
-      c["column"] = cell.column;
-      c["rowWeight"] = grid->GetRowWeight(cell.row);
+    key("lines");
+    out += '[';
+    for (int i = 0; i < combo->GetLineCount(); ++i) {
+      if (i) out += ',';
+      AppendText(out, combo->GetLine(i).Utf8());
     }
-    children.push_back(std::move(c));
+    out += ']';
+    key("selectedIndex");
+    out += std::to_string(combo->GetSelectedIndex());
   }
-  node["children"] = children;
-  return node;
+  if (cell) {
+    key("row");
+    out += std::to_string(cell->row);
+    key("column");
+    out += std::to_string(cell->column);
+    key("rowWeight");
+    AppendNumber(out, rowWeight);
+  }
+  key("children");
+  out += '[';
+  const size_t idLength = id.size();
+  auto child = [&](size_t index, QelVidWidget* c, const QelVidGridConstraints* constraints, double weight) {
+    if (index) out += ',';
+    id += '.';
+    id += std::to_string(index);
+    AppendWidget(c, id, out, constraints, weight);
+    id.resize(idLength);
+  };
+  if (auto* grid = dynamic_cast<QelVidLayGrid*>(w)) {
+    const auto cells = grid->GetCellsInOrder();
+    for (size_t i = 0; i < cells.size(); ++i)
+      child(i, cells[i].first, &cells[i].second, grid->GetRowWeight(cells[i].second.row));
+  } else {
+    for (int i = 0; i < w->GetChildCount(); ++i) child(size_t(i), w->GetChild(i), nullptr, 0.0);
+  }
+  out += "]}";
 }
 }  // namespace
 
@@ -137,6 +246,35 @@ std::string QelVidPrintText(QelVidWidget* root) {
 }
 
 std::string QelVidPrintJson(QelVidWidget* root, int indent) {
-  if (!root) return "null";
-  return WidgetJson(root).dump(indent);
+  std::string out;
+  QelVidAppendJson(root, out);
+  // A person reads the indented form; the compact one is the fast path for the web view.
+  return indent < 0 || !root ? out : nlohmann::json::parse(out).dump(indent);
+}
+
+void QelVidAppendJson(QelVidWidget* root, std::string& out) {
+  if (!root) {
+    out += "null";
+    return;
+  }
+  std::string id = "0";
+  AppendWidget(root, id, out, nullptr, 0.0);
+}
+
+QelVidWidget* QelVidFindById(QelVidWidget* root, std::string_view id) {
+  if (!root || id.substr(0, 1) != "0") return nullptr;
+  QelVidWidget* w = root;
+  for (id.remove_prefix(1); !id.empty();) {
+    if (id[0] != '.') return nullptr;
+    id.remove_prefix(1);
+    size_t index = 0, digits = 0;
+    for (; digits < id.size() && digits < 9 && id[digits] >= '0' && id[digits] <= '9'; ++digits)
+      index = index * 10 + static_cast<size_t>(id[digits] - '0');
+    if (digits == 0 || (digits > 1 && id[0] == '0')) return nullptr;
+    id.remove_prefix(digits);
+    const std::vector<QelVidWidget*> children = ChildrenInOrder(w);
+    if (index >= children.size()) return nullptr;
+    w = children[index];
+  }
+  return w;
 }

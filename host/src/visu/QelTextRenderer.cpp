@@ -4,10 +4,34 @@
 #include FT_FREETYPE_H
 
 #include <algorithm>
+#include <unordered_map>
+#include <vector>
 
 struct QelTextRenderer::Face {
+  // A character's rendered coverage, kept: a picture of a large model sets thousands of
+  // texts from a few dozen characters, and FreeType's hinting is the cost of each.
+  struct Glyph {
+    bool loaded = false;
+    int left = 0, top = 0, advance = 0;
+    unsigned width = 0, rows = 0;
+    std::vector<uint8_t> coverage;  // rows x width
+  };
+
+  const Glyph& Get(char32_t code) {
+    Glyph& glyph = glyphs[code];
+    if (glyph.loaded || FT_Load_Char(face, code, FT_LOAD_RENDER) != 0) return glyph;
+    const FT_GlyphSlot g = face->glyph;
+    const FT_Bitmap& bm = g->bitmap;
+    glyph = {true, g->bitmap_left, g->bitmap_top, static_cast<int>(g->advance.x >> 6), bm.width, bm.rows, {}};
+    glyph.coverage.resize(size_t(bm.width) * bm.rows);
+    for (unsigned row = 0; row < bm.rows; ++row)
+      std::copy_n(bm.buffer + row * bm.pitch, bm.width, glyph.coverage.begin() + row * bm.width);
+    return glyph;
+  }
+
   FT_Library library = nullptr;
   FT_Face face = nullptr;
+  std::unordered_map<char32_t, Glyph> glyphs;
   ~Face() {
     if (face) FT_Done_Face(face);
     if (library) FT_Done_FreeType(library);
@@ -52,10 +76,7 @@ bool QelTextRenderer::IsReady() const { return face_ != nullptr; }
 int QelTextRenderer::Measure(const std::string& text) const {
   if (!face_) return 0;
   int width = 0;
-  for (size_t i = 0; i < text.size();) {
-    if (FT_Load_Char(face_->face, NextChar(text, i), FT_LOAD_DEFAULT) == 0)
-      width += static_cast<int>(face_->face->glyph->advance.x >> 6);
-  }
+  for (size_t i = 0; i < text.size();) width += face_->Get(NextChar(text, i)).advance;
   return width;
 }
 
@@ -66,15 +87,14 @@ void QelTextRenderer::Draw(QelPixelImage& image, int x, int y, const std::string
   const float ink[3] = {color.r * 255.0f, color.g * 255.0f, color.b * 255.0f};
   int pen = x;
   for (size_t i = 0; i < text.size();) {
-    if (FT_Load_Char(face_->face, NextChar(text, i), FT_LOAD_RENDER) != 0) continue;
-    const FT_GlyphSlot g = face_->face->glyph;
-    const FT_Bitmap& bm = g->bitmap;
-    for (unsigned row = 0; row < bm.rows; ++row) {
-      for (unsigned col = 0; col < bm.width; ++col) {
-        const float alpha = bm.buffer[row * bm.pitch + col] / 255.0f;
+    const Face::Glyph& g = face_->Get(NextChar(text, i));
+    if (!g.loaded) continue;
+    for (unsigned row = 0; row < g.rows; ++row) {
+      for (unsigned col = 0; col < g.width; ++col) {
+        const float alpha = g.coverage[row * g.width + col] / 255.0f;
         if (alpha == 0.0f) continue;
-        const int px = pen + g->bitmap_left + static_cast<int>(col);
-        const int py = baseline - g->bitmap_top + static_cast<int>(row);
+        const int px = pen + g.left + static_cast<int>(col);
+        const int py = baseline - g.top + static_cast<int>(row);
         uint8_t r, gr, b;
         if (px < 0 || py < 0 || px >= image.GetWidth() || py >= image.GetHeight()) continue;
         image.GetPixel(px, py, r, gr, b);
@@ -82,6 +102,6 @@ void QelTextRenderer::Draw(QelPixelImage& image, int x, int y, const std::string
         image.SetPixel(px, py, mix(r, ink[0]), mix(gr, ink[1]), mix(b, ink[2]));
       }
     }
-    pen += static_cast<int>(g->advance.x >> 6);
+    pen += g.advance;
   }
 }

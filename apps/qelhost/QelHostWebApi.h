@@ -1,0 +1,88 @@
+#pragma once
+// QelHostWebApi: the review page's API on an open session, plain text in and out, so it
+// runs without sockets. Every call must come from the UI thread (the session's objects are
+// counted and single-threaded). Made after the session has opened its model, it keeps the
+// views browser open and a question asker installed; both go with it, before the session.
+#include <map>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "QelCallbackManager.h"
+#include "QelDlgNotify.h"
+#include "QelHostWebRequest.h"
+#include "QelVar.h"
+
+class QelDbrBrowser;
+class QelHostSession;
+
+// With its parameter, so the HTTP library does not compress the answer: its brotli
+// compression at full quality takes seconds on a large panel, far more than loopback saves.
+inline constexpr const char* kQelJsonType = "application/json; charset=utf-8";
+
+struct QelHostWebReply {
+  int status = 200;
+  std::string contentType = kQelJsonType;
+  std::string body;
+};
+
+class QelHostWebApi {
+ public:
+  explicit QelHostWebApi(QelHostSession& session);
+  ~QelHostWebApi();
+  QelHostWebApi(const QelHostWebApi&) = delete;
+  QelHostWebApi& operator=(const QelHostWebApi&) = delete;
+
+  QelHostWebReply State();
+  QelHostWebReply Event(std::string_view body);
+  QelHostWebReply Answer(std::string_view body);
+  QelHostWebReply Camera(std::string_view body);
+  QelHostWebReply Activate(std::string_view body);
+  // The 3D viewer's picture as PNG; the size is clamped to 64..2048.
+  QelHostWebReply Picture(int width, int height);
+  QelHostWebReply Thumbnail(int item);
+
+  // Grows whenever the picture would change.
+  int PictureVersion() const { return version_; }
+
+ private:
+  struct Changes {
+    std::vector<std::string> shown, hidden;
+  };
+  struct Question {
+    std::string title, message;
+  };
+
+  void BeginChanges();
+  Changes EndChanges();
+  // Runs the event on its widget, recording what it changed; false with `error` when the
+  // event names no widget that takes it.
+  bool Run(const QelHostWebEvent& event, Changes& changes, std::string& error);
+  bool Dispatch(const QelHostWebEvent& event, std::string& error);
+  QelHostWebReply StateWith(const Changes& changes);
+  std::string BrowserJson();
+  int ItemId(QelBaseUnknown* item);
+
+  QelHostSession& session_;
+  QelVar<QelDbrBrowser> browser_;
+  std::vector<QelBaseUnknown_var> items_;  // item id - 1
+  std::map<QelBaseUnknown*, int> itemIds_;
+  std::map<int, std::string> thumbnails_;  // PNG bytes by item id
+  // The annotations of every set, for the display counts.
+  std::vector<std::pair<QelBaseUnknown_var, std::vector<QelBaseUnknown_var>>> annotationsBySet_;
+
+  QelCallbackId displayCallback_ = 0;
+  bool recording_ = false;
+  std::vector<QelBaseUnknown_var> changed_;
+  std::map<QelBaseUnknown*, bool> shownBefore_;
+
+  QelDlgNotify::Asker previousAsker_;
+  std::optional<Question> asked_;     // by the module during the current event
+  std::optional<Question> question_;  // waiting for the person
+  std::optional<QelHostWebEvent> pending_;
+
+  int version_ = 1;
+  int pictureVersion_ = 0, pictureWidth_ = 0, pictureHeight_ = 0;
+  std::string picture_;
+};

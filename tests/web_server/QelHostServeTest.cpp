@@ -1,0 +1,313 @@
+// qelhost serve as the review page meets it: each test starts the real program on a free
+// port with a placeholder page, talks to it over loopback and stops it with SIGTERM, which
+// must end it cleanly.
+#include <fcntl.h>
+#include <gtest/gtest.h>
+#include <httplib.h>
+#include <poll.h>
+#include <signal.h>
+#include <sys/wait.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <functional>
+#include <nlohmann/json.hpp>
+#include <optional>
+#include <regex>
+#include <set>
+#include <sstream>
+
+namespace fs = std::filesystem;
+using json = nlohmann::json;
+
+namespace {
+struct Size {
+  int width, height;
+};
+
+std::optional<Size> PngSize(const std::string& png) {
+  if (png.size() < 24 || png.compare(1, 3, "PNG") != 0) return std::nullopt;
+  auto at = [&](size_t i) {
+    return int(uint8_t(png[i])) << 24 | int(uint8_t(png[i + 1])) << 16 | int(uint8_t(png[i + 2])) << 8 |
+           int(uint8_t(png[i + 3]));
+  };
+  return Size{at(16), at(20)};
+}
+
+void Walk(const json& node, const std::function<void(const json&, const std::vector<const json*>&)>& visit,
+          std::vector<const json*>& path) {
+  path.push_back(&node);
+  visit(node, path);
+  for (const json& child : node["children"]) Walk(child, visit, path);
+  path.pop_back();
+}
+
+// The id of the visible part `part` in the panel row labelled `label`.
+std::string PartOfRow(const json& panel, const std::string& label, const std::set<std::string>& parts) {
+  std::string found;
+  std::vector<const json*> path;
+  Walk(panel, [&](const json& node, const std::vector<const json*>& ancestors) {
+    if (!found.empty() || node["name"] != "PropertyLabel" || node["attributes"].value("text", "") != label) return;
+    for (auto row = ancestors.rbegin(); row != ancestors.rend() && found.empty(); ++row) {
+      std::vector<const json*> inner;
+      Walk(**row, [&](const json& n, const std::vector<const json*>&) {
+        if (found.empty() && parts.count(n["name"].get<std::string>()) && n["visible"] == true) found = n["id"];
+      }, inner);
+    }
+  }, path);
+  return found;
+}
+
+class QelHostServeTest : public ::testing::Test {
+ protected:
+  void SetUp() override {
+    folder_ = fs::path(QEL_BINARY_DIR) / "web-server-test" / ::testing::UnitTest::GetInstance()->current_test_info()->name();
+    fs::remove_all(folder_);
+    // The host's catalogs and styles, and a placeholder where the page will be.
+    const fs::path resources = folder_ / "resources";
+    fs::create_directories(resources / "web");
+    for (const char* part : {"catalogs", "styles"})
+      fs::create_directory_symlink(fs::path(QEL_SOURCE_DIR) / "host" / "resources" / part, resources / part);
+    std::ofstream(resources / "web" / "index.html") << "<!DOCTYPE html><title>review</title>\n";
+    settings_ = folder_ / "settings";
+    fs::create_directories(settings_);
+
+    int out[2];
+    ASSERT_EQ(pipe(out), 0);
+    pid_ = fork();
+    ASSERT_GE(pid_, 0);
+    if (pid_ == 0) {
+      dup2(out[1], STDOUT_FILENO);
+      close(out[0]);
+      close(out[1]);
+      setenv("QEL_RESOURCES_DIR", resources.c_str(), 1);
+      setenv("QEL_SETTINGS_DIR", settings_.c_str(), 1);
+      execl(QEL_HOST_PROGRAM, QEL_HOST_PROGRAM, "serve", "--port", "0", static_cast<char*>(nullptr));
+      _exit(127);
+    }
+    close(out[1]);
+    out_ = out[0];
+    const std::string line = ReadUntil("http://127.0.0.1:");
+    std::smatch m;
+    ASSERT_TRUE(std::regex_search(line, m, std::regex(R"(http://127\.0\.0\.1:(\d+)/\?token=([0-9a-f]{32}))"))) << line;
+    port_ = std::stoi(m[1]);
+    token_ = m[2];
+    client_ = std::make_unique<httplib::Client>("127.0.0.1", port_);
+  }
+
+  void TearDown() override {
+    if (pid_ <= 0) return;
+    client_.reset();
+    kill(pid_, SIGTERM);
+    const std::string rest = ReadUntil("qelhost: stopped");
+    // One that does not stop fails the test rather than hang it.
+    if (rest.find("qelhost: stopped") == std::string::npos) kill(pid_, SIGKILL);
+    int status = 0;
+    waitpid(pid_, &status, 0);
+    close(out_);
+    EXPECT_NE(rest.find("qelhost: stopped"), std::string::npos) << rest;
+    EXPECT_TRUE(WIFEXITED(status) && WEXITSTATUS(status) == 0) << "status " << status;
+  }
+
+  // Standard output up to the line holding `text` (or the end, after 20 s at most).
+  std::string ReadUntil(const std::string& text) {
+    std::string seen;
+    char buffer[4096];
+    for (int waited = 0; seen.find(text) == std::string::npos && waited < 200;) {
+      pollfd fd{out_, POLLIN, 0};
+      if (poll(&fd, 1, 100) <= 0) {
+        ++waited;
+        continue;
+      }
+      const ssize_t n = read(out_, buffer, sizeof buffer);
+      if (n <= 0) break;
+      seen.append(buffer, size_t(n));
+    }
+    return seen;
+  }
+
+  httplib::Headers Token() const { return {{"X-Qel-Token", token_}}; }
+  httplib::Result Get(const std::string& path) { return client_->Get(path.c_str(), Token()); }
+  httplib::Result Post(const std::string& path, const std::string& body) {
+    return client_->Post(path.c_str(), Token(), body, "application/json");
+  }
+  json State() {
+    auto res = Get("/api/state");
+    EXPECT_TRUE(res && res->status == 200);
+    return res ? json::parse(res->body) : json();
+  }
+  // Posts and expects a State back.
+  json Send(const std::string& path, const json& body) {
+    auto res = Post(path, body.dump());
+    EXPECT_TRUE(res && res->status == 200) << path << " " << body << " -> " << (res ? res->body : "no answer");
+    return res && res->status == 200 ? json::parse(res->body) : json();
+  }
+  json Click(const json& state, const std::string& label) {
+    const std::string id = PartOfRow(state["panel"], label, {"CheckBox", "RadioButton"});
+    EXPECT_FALSE(id.empty()) << "no row " << label;
+    return Send("/api/event", {{"id", id}, {"type", "click"}});
+  }
+  std::string Picture() {
+    auto res = Get("/api/picture.png");
+    return res && res->status == 200 ? res->body : std::string();
+  }
+
+  fs::path folder_, settings_;
+  pid_t pid_ = -1;
+  int out_ = -1;
+  int port_ = 0;
+  std::string token_;
+  std::unique_ptr<httplib::Client> client_;
+};
+
+TEST_F(QelHostServeTest, RefusesRequestsWithoutTheTokenOrFromAnotherHostName) {
+  auto none = client_->Get("/api/state");
+  ASSERT_TRUE(none);
+  EXPECT_EQ(none->status, 403);
+  EXPECT_EQ(std::count(none->body.begin(), none->body.end(), '\n'), 1) << none->body;
+  EXPECT_EQ(client_->Get("/api/state", {{"X-Qel-Token", std::string(32, '0')}})->status, 403);
+  // The query form of the token opens the page only.
+  EXPECT_EQ(client_->Get(("/api/state?token=" + token_).c_str())->status, 403);
+  // A page of another site whose name resolves here.
+  EXPECT_EQ(client_->Get("/api/state", {{"X-Qel-Token", token_}, {"Host", "evil.example:" + std::to_string(port_)}})->status,
+            403);
+  EXPECT_EQ(client_->Get("/", {{"Host", "127.0.0.1:1"}})->status, 403);
+
+  auto page = client_->Get(("/?token=" + token_).c_str());
+  ASSERT_TRUE(page);
+  EXPECT_EQ(page->status, 200);
+  EXPECT_NE(page->body.find("<title>review</title>"), std::string::npos);
+  EXPECT_EQ(page->get_header_value("Set-Cookie"), "qeltoken=" + token_ + "; Path=/; HttpOnly; SameSite=Strict");
+  EXPECT_EQ(client_->Get("/api/state", {{"Cookie", "other=1; qeltoken=" + token_}})->status, 200);
+  EXPECT_EQ(client_->Get("/api/state", {{"Host", "localhost:" + std::to_string(port_)}, {"X-Qel-Token", token_}})->status,
+            200);
+}
+
+TEST_F(QelHostServeTest, RefusesBadRequestsAndChangesNothing) {
+  const json before = State();
+  EXPECT_EQ(Post("/api/event", std::string(70000, ' '))->status, 413);
+  EXPECT_EQ(Get("/api/event")->status, 405);
+  const std::pair<std::string, std::string> bad[] = {
+      {"/api/event", "{\"id\": \"0\", "},                                    // not JSON
+      {"/api/event", "[1]"},                                                 // not an object
+      {"/api/event", R"({"type": "click"})"},                                // no widget
+      {"/api/event", R"({"id": "0.99.1", "type": "click"})"},                // unknown widget
+      {"/api/event", R"({"id": "0", "type": "drag"})"},                      // unknown event
+      {"/api/event", R"({"id": "0", "type": "click"})"},                     // the panel is no button
+      {"/api/event", R"({"id": "0.0", "type": "select", "index": -1})"},
+      {"/api/answer", R"({"answer": "yes"})"},                               // nothing asked
+      {"/api/camera", R"({"zoom": 0})"},
+      {"/api/camera", R"({"zoom": 2, "reframe": true})"},
+      {"/api/activate", R"({"item": 999})"},
+      {"/api/event", std::string(40, '[')},
+  };
+  for (const auto& [path, body] : bad) {
+    auto res = Post(path, body);
+    ASSERT_TRUE(res) << body;
+    EXPECT_EQ(res->status, 400) << path << " " << body;
+    const json error = json::parse(res->body, nullptr, false);
+    EXPECT_TRUE(error.is_object() && error["error"].is_string() && !error["error"].get<std::string>().empty())
+        << res->body;
+  }
+  const json after = State();
+  EXPECT_EQ(after["display"], before["display"]);
+  EXPECT_EQ(after["picture"], before["picture"]);
+}
+
+TEST_F(QelHostServeTest, ClickOnASetHidesItAndItsAnnotationsLeaveThePicture) {
+  const json before = State();
+  const std::string picture = Picture();
+  ASSERT_EQ(PngSize(picture).value_or(Size{}).width, 800);
+  const json after = Click(before, "Shaft_Rep/Shaft/Shaft Inspection");
+  EXPECT_EQ(after["changes"]["hidden"], json::array({"Shaft Inspection"}));
+  EXPECT_EQ(after["changes"]["shown"], json::array());
+  EXPECT_LT(after["display"]["shown"], before["display"]["shown"]);
+  EXPECT_NE(after["picture"], before["picture"]);
+  EXPECT_NE(Picture(), picture);
+  // The rebuilt panel shows the row unticked.
+  const std::string box = PartOfRow(after["panel"], "Shaft_Rep/Shaft/Shaft Inspection", {"CheckBox"});
+  std::vector<const json*> path;
+  int checked = -1;
+  Walk(after["panel"], [&](const json& node, const std::vector<const json*>&) {
+    if (node["id"] == box) checked = node["attributes"].value("checked", -1);
+  }, path);
+  EXPECT_EQ(checked, 0);
+
+  // A range typed and chosen through the row's own parts, applied by its tick.
+  const json filtered = [&] {
+    const std::string editor = PartOfRow(after["panel"], "Tolerance value", {"LeftEditor"});
+    const std::string combo = PartOfRow(after["panel"], "Tolerance value", {"LeftCombo"});
+    EXPECT_FALSE(editor.empty() || combo.empty());
+    Send("/api/event", {{"id", combo}, {"type", "select"}, {"index", 0}});
+    Send("/api/event", {{"id", editor}, {"type", "text"}, {"text", "0.05"}});
+    return Click(State(), "Tolerance value");
+  }();
+  EXPECT_FALSE(filtered["changes"]["hidden"].empty()) << filtered["changes"];
+  EXPECT_LT(filtered["display"]["shown"], after["display"]["shown"]);
+}
+
+TEST_F(QelHostServeTest, AllSetsQuestionIsAnsweredThroughTheApi) {
+  const json none = Click(State(), "No set");
+  ASSERT_EQ(none["display"]["shown"], 0);
+
+  // The question is refused while the request runs and kept for the person.
+  json asked = Click(none, "All sets");
+  ASSERT_TRUE(asked["question"].is_object());
+  EXPECT_FALSE(asked["question"]["title"].get<std::string>().empty());
+  EXPECT_EQ(asked["changes"]["shown"], json::array());
+  const json no = Send("/api/answer", {{"answer", "no"}});
+  EXPECT_TRUE(no["question"].is_null());
+  EXPECT_EQ(no["changes"]["shown"], json::array());
+  EXPECT_EQ(no["display"], none["display"]);
+  EXPECT_EQ(Post("/api/answer", R"({"answer": "yes"})")->status, 400);
+
+  // Any other request drops the question.
+  ASSERT_TRUE(Click(no, "All sets")["question"].is_object());
+  Send("/api/camera", {{"reframe", true}});
+  EXPECT_EQ(Post("/api/answer", R"({"answer": "yes"})")->status, 400);
+
+  ASSERT_TRUE(Click(State(), "All sets")["question"].is_object());
+  const json yes = Send("/api/answer", {{"answer", "yes"}});
+  EXPECT_TRUE(yes["question"].is_null());
+  EXPECT_EQ(yes["changes"]["shown"].size(), 4u) << yes["changes"];
+  EXPECT_GT(yes["display"]["shown"], 0);
+}
+
+TEST_F(QelHostServeTest, CameraCapturesAndThumbnailsChangeThePicture) {
+  const json start = State();
+  EXPECT_EQ(PngSize(Get("/api/picture.png?w=10&h=5000")->body).value_or(Size{}).height, 2048);
+  const std::string picture = Picture();
+  const json orbited = Send("/api/camera", {{"orbit", {30, 10}}});
+  EXPECT_NE(orbited["picture"], start["picture"]);
+  const std::string turned = Picture();
+  EXPECT_NE(turned, picture);
+  Send("/api/camera", {{"zoom", 2}});
+  EXPECT_NE(Picture(), turned);
+
+  // A light capture: its thumbnail, and its viewpoint when chosen.
+  int capture = 0;
+  for (const json& node : start["browser"]["nodes"])
+    for (const json& item : node["items"])
+      if (!capture && item["thumbnail"].is_string() && item["kind"] == "capture") capture = item["item"];
+  ASSERT_GT(capture, 0) << start["browser"];
+  auto thumbnail = Get("/api/thumbnail/" + std::to_string(capture) + ".png");
+  ASSERT_TRUE(thumbnail && thumbnail->status == 200);
+  EXPECT_EQ(PngSize(thumbnail->body).value_or(Size{}).width, 576);
+  EXPECT_EQ(Get("/api/thumbnail/999.png")->status, 404);
+  const std::string before = Picture();
+  Send("/api/activate", {{"item", capture}});
+  EXPECT_NE(Picture(), before);
+}
+
+TEST_F(QelHostServeTest, StopSavesTheSettings) {
+  // TearDown stops the program; the panel's setting it switched on is then on disk.
+  TearDown();
+  pid_ = -1;
+  std::ifstream file(settings_ / "QelRovDataFiltering.json");
+  std::stringstream text;
+  text << file.rdbuf();
+  EXPECT_NE(text.str().find("DataFilteringPanel_LumReview"), std::string::npos) << text.str();
+}
+}  // namespace
