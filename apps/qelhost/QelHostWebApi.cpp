@@ -198,7 +198,7 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
   QelHostWebReply reply;
   std::string& body = reply.body;
   body = "{\"panel\":";
-  QelVidAppendJson(panel, body);  // most of the answer: written in place, never copied
+  QelVidAppendJson(panel, body, true);  // most of the answer: written in place, never copied
   body += ",\"browser\":" + BrowserJson();
   body += ",\"changes\":" + Dump(json{{"shown", changes.shown}, {"hidden", changes.hidden}});
   body += ",\"display\":" + Dump(json{{"shown", shown}, {"hidden", hidden}});

@@ -180,6 +180,8 @@ TEST_F(QelHostServeTest, RefusesRequestsWithoutTheTokenOrFromAnotherHostName) {
   EXPECT_EQ(page->status, 200);
   EXPECT_NE(page->body.find("<title>review</title>"), std::string::npos);
   EXPECT_EQ(page->get_header_value("Set-Cookie"), "qeltoken=" + token_ + "; Path=/; HttpOnly; SameSite=Strict");
+  // Cookies ignore the port: an earlier server's cookie must not lock out the new address.
+  EXPECT_EQ(client_->Get(("/?token=" + token_).c_str(), {{"Cookie", "qeltoken=" + std::string(32, 'f')}})->status, 200);
   EXPECT_EQ(client_->Get("/api/state", {{"Cookie", "other=1; qeltoken=" + token_}})->status, 200);
   EXPECT_EQ(client_->Get("/api/state", {{"Host", "localhost:" + std::to_string(port_)}, {"X-Qel-Token", token_}})->status,
             200);

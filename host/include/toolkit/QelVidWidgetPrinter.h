@@ -15,6 +15,8 @@ std::string QelVidPrintText(QelVidWidget* root);
 // indent -1: the compact form.
 std::string QelVidPrintJson(QelVidWidget* root, int indent = 2);
 // The compact form appended to `out`, for an answer that holds the tree among other things.
-void QelVidAppendJson(QelVidWidget* root, std::string& out);
+// With `seenOnly`, hidden widgets and the bodies of closed sections are sent without their
+// children (ids stay those of the whole tree): what a view draws, at a fraction of the size.
+void QelVidAppendJson(QelVidWidget* root, std::string& out, bool seenOnly = false);
 // The widget at `id` under `root`, or null for a malformed id or a path that leads nowhere.
 QelVidWidget* QelVidFindById(QelVidWidget* root, std::string_view id);

@@ -162,8 +162,11 @@ void AppendValue(std::string& out, const QelSYPValue& value) {
   }
 }
 
+// With `seenOnly`, the nodes a person cannot see (hidden widgets, the body of a closed
+// section) keep their place and id but lose their children: at 10k rows that is most of the
+// tree.
 void AppendWidget(QelVidWidget* w, std::string& id, std::string& out, const QelVidGridConstraints* cell,
-                  double rowWeight) {
+                  double rowWeight, bool seenOnly, bool pruned) {
   auto key = [&out](const char* name) {
     out += ",\"";
     out += name;
@@ -220,20 +223,30 @@ void AppendWidget(QelVidWidget* w, std::string& id, std::string& out, const QelV
   }
   key("children");
   out += '[';
+  if (pruned) {
+    out += "]}";
+    return;
+  }
+  auto* closed = dynamic_cast<QelVidCtlExpander*>(w);
+  if (closed && closed->GetExpandedState()) closed = nullptr;
   const size_t idLength = id.size();
-  auto child = [&](size_t index, QelVidWidget* c, const QelVidGridConstraints* constraints, double weight) {
+  auto child = [&](size_t index, size_t count, QelVidWidget* c, const QelVidGridConstraints* constraints,
+                   double weight) {
     if (index) out += ',';
     id += '.';
     id += std::to_string(index);
-    AppendWidget(c, id, out, constraints, weight);
+    // A section's body is its last child.
+    const bool unseen = seenOnly && (!c->GetVisibleFlag() || (closed && index + 1 == count));
+    AppendWidget(c, id, out, constraints, weight, seenOnly, unseen);
     id.resize(idLength);
   };
   if (auto* grid = dynamic_cast<QelVidLayGrid*>(w)) {
     const auto cells = grid->GetCellsInOrder();
     for (size_t i = 0; i < cells.size(); ++i)
-      child(i, cells[i].first, &cells[i].second, grid->GetRowWeight(cells[i].second.row));
+      child(i, cells.size(), cells[i].first, &cells[i].second, grid->GetRowWeight(cells[i].second.row));
   } else {
-    for (int i = 0; i < w->GetChildCount(); ++i) child(size_t(i), w->GetChild(i), nullptr, 0.0);
+    const size_t count = static_cast<size_t>(w->GetChildCount());
+    for (size_t i = 0; i < count; ++i) child(i, count, w->GetChild(static_cast<int>(i)), nullptr, 0.0);
   }
   out += "]}";
 }
@@ -252,13 +265,13 @@ std::string QelVidPrintJson(QelVidWidget* root, int indent) {
   return indent < 0 || !root ? out : nlohmann::json::parse(out).dump(indent);
 }
 
-void QelVidAppendJson(QelVidWidget* root, std::string& out) {
+void QelVidAppendJson(QelVidWidget* root, std::string& out, bool seenOnly) {
   if (!root) {
     out += "null";
     return;
   }
   std::string id = "0";
-  AppendWidget(root, id, out, nullptr, 0.0);
+  AppendWidget(root, id, out, nullptr, 0.0, seenOnly, false);
 }
 
 QelVidWidget* QelVidFindById(QelVidWidget* root, std::string_view id) {

@@ -5,6 +5,7 @@
 #include <cmath>
 #include <cstdint>
 #include <numbers>
+#include <optional>
 #include <vector>
 
 #include "QelMathVectorf.h"
@@ -262,30 +263,19 @@ class LabelPlacer {
   }
 
   // The frame of size w x h for an anchor: up and right of it when that is free, else the
-  // first free place among rows stacked above and below it and the same on its left. A
-  // moved frame stays inside the picture; when no place is free the frame keeps its first
-  // place and covers what is there.
-  Box Place(int ax, int ay, int w, int h) {
+  // first free place among rows stacked above and below it and the same on its left, inside
+  // the picture. None when all are taken: in a crowd, a frame covering others would only
+  // make both unreadable, so the anchor's mark alone stands for it.
+  std::optional<Box> Place(int ax, int ay, int w, int h) {
     const Box first{ax + 6, ay - 6 - h, w, h};
-    Box chosen = first;
-    if (!Free(first)) {
-      bool found = false;
-      for (int step = 1; step <= kSteps && !found; ++step) {
-        for (const int dir : {-1, 1}) {
-          for (const int left : {ax + 6, ax - 6 - w}) {
-            const Box b{left, first.top + dir * step * (h + 2), w, h};
-            if (Inside(b) && Free(b)) {
-              chosen = b;
-              found = true;
-              break;
-            }
-          }
-          if (found) break;
+    if (Free(first)) return Mark(first);
+    for (int step = 1; step <= kSteps; ++step)
+      for (const int dir : {-1, 1})
+        for (const int left : {ax + 6, ax - 6 - w}) {
+          const Box b{left, first.top + dir * step * (h + 2), w, h};
+          if (Inside(b) && Free(b)) return Mark(b);
         }
-      }
-    }
-    Mark(chosen);
-    return chosen;
+    return std::nullopt;
   }
 
  private:
@@ -310,10 +300,11 @@ class LabelPlacer {
     });
     return free;
   }
-  void Mark(const Box& b) {
+  Box Mark(const Box& b) {
     boxes_.push_back(b);
     const int index = static_cast<int>(boxes_.size()) - 1;
     ForCells(b, [&](size_t cell) { grid_[cell].push_back(index); });
+    return b;
   }
   int width_, height_, cols_, rows_;
   std::vector<Box> boxes_;
@@ -357,8 +348,9 @@ void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
   const int textWidth = view.text ? view.text->Measure(a.text) : 0;
   const int textHeight = view.text ? view.text->LineHeight() : 10;
   const int w = std::max(textWidth, 24) + 2 * pad, h = textHeight + 2 * pad;
-  const LabelPlacer::Box box = labels.Place(ax, ay, w, h);
-  const int left = box.left, top = box.top;
+  const std::optional<LabelPlacer::Box> box = labels.Place(ax, ay, w, h);
+  if (!box) return;
+  const int left = box->left, top = box->top;
   // A frame moved aside keeps a thin leader to its anchor.
   if (left != ax + 6 || top != ay - 6 - h)
     Line(image, ax, ay, left < ax ? left + w - 1 : left, top < ay ? top + h - 1 : top, rgb);
