@@ -22,6 +22,7 @@
     noPanel: 'No panel is open.',
     noItems: 'No views or captures to browse.',
     noPreview: 'No preview',
+    notShown: 'Only captures of sets loaded light can be shown',
     capture: 'Capture',
     view: 'View',
     noJson: 'the host answered something that is not JSON',
@@ -451,6 +452,11 @@
           about.appendChild(description);
         }
         button.append(thumb, about);
+        // Only a capture with an item adapter (a light set's) can be activated.
+        if (item.kind !== 'capture' || !item.thumbnail) {
+          button.disabled = true;
+          button.title = words.notShown;
+        }
         button.addEventListener('click', () => activate(item.item));
         entry.appendChild(button);
         list.appendChild(entry);
