@@ -219,7 +219,15 @@ TEST_F(QelHostServeTest, RefusesBadRequestsAndChangesNothing) {
 }
 
 TEST_F(QelHostServeTest, ClickOnASetHidesItAndItsAnnotationsLeaveThePicture) {
-  const json before = State();
+  // A closed section's rows are not sent; opening it brings them.
+  const json closed = State();
+  EXPECT_TRUE(PartOfRow(closed["panel"], "Shaft_Rep/Shaft/Shaft Inspection", {"CheckBox"}).empty());
+  std::string section;
+  std::vector<const json*> at;
+  Walk(closed["panel"], [&](const json& node, const std::vector<const json*>&) {
+    if (node["name"] == "Selected sets_Expander") section = node["id"];
+  }, at);
+  const json before = Send("/api/event", {{"id", section}, {"type", "expand"}});
   const std::string picture = Picture();
   ASSERT_EQ(PngSize(picture).value_or(Size{}).width, 800);
   const json after = Click(before, "Shaft_Rep/Shaft/Shaft Inspection");
