@@ -183,10 +183,12 @@ class TemplateCompiler {
   TemplateCompiler(const std::string& className, const QelSYPMetaClass* meta) : className_(className), meta_(meta) {}
 
   // The template's root, with the totals of the whole tree.
-  std::shared_ptr<QelVidCompiledPart> CompileTemplate(const json& node, const std::string& place) {
+  std::shared_ptr<QelVidCompiledPart> CompileTemplate(const json& node, const std::string& style,
+                                                      const std::string& place) {
     auto root = std::make_shared<QelVidCompiledPart>(Compile(node, place));
     root->handlerSlots = handlerNames_.size();
     root->index = std::make_shared<QelVidCtl::TemplateIndex>();
+    root->index->style = QelString(style);
     Number(*root, *root);
     return root;
   }
@@ -485,7 +487,7 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
       if (!it->is_object() || !it->contains("template"))
         throw StyleError{"/styles/" + style, "a style is an object with a \"template\""};
       TemplateCompiler compiler(control->IsA(), meta);
-      compiled = compiler.CompileTemplate((*it)["template"], "/styles/" + style + "/template");
+      compiled = compiler.CompileTemplate((*it)["template"], style, "/styles/" + style + "/template");
     } catch (const StyleError& e) {
       document_->compiled.erase({style, meta});
       Report("style sheet " + path_ + ": style \"" + style + "\": at " + e.place + ": " + e.what);
