@@ -115,9 +115,14 @@ class QelVidWidget : public QelISYPIntrospectable {
       return nullptr;
     }
     const Entry* Find(const std::string& name) const { return const_cast<Attributes*>(this)->Find(name); }
-    void Append(Entry entry) {
-      if (localCount_ < kLocal) local_[localCount_++] = std::move(entry);
-      else more_.push_back(std::move(entry));
+    void Append(const std::string& name, const QelSYPValue& value) {
+      if (localCount_ == kLocal) {
+        more_.emplace_back(name, value);
+        return;
+      }
+      Entry& entry = local_[localCount_++];
+      entry.first = name;
+      entry.second = value;
     }
     void Reserve(size_t count) {
       if (count > kLocal) more_.reserve(count - kLocal);

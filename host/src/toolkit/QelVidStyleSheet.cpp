@@ -56,6 +56,7 @@ struct QelVidCompiledPart {
   };
   std::vector<Route> routes;
   std::vector<QelVidCompiledPart> children;
+  bool grid = false;  // a Grid places its children by `cells`
   std::vector<std::optional<QelVidGridConstraints>> cells;  // for a Grid's children
   std::unique_ptr<QelVidCompiledPart> header;
   std::unique_ptr<QelVidCompiledPart> body;
@@ -295,6 +296,7 @@ class TemplateCompiler {
     if (!it->is_array()) throw StyleError{place + "/children", "not a list"};
     if (expander) throw StyleError{place + "/children", "an Expander has a header and a body, not children"};
     const bool grid = part.kind == "Grid";
+    part.grid = grid;
     for (size_t i = 0; i < it->size(); ++i) {
       const std::string at = place + "/children/" + std::to_string(i);
       part.children.push_back(Compile((*it)[i], at));
@@ -392,7 +394,8 @@ QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, std::vector<
     }
   }
   if (compiled.children.empty()) return part;
-  auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
+  // The maker of a Grid part makes a QelVidLayGrid.
+  auto* grid = compiled.grid ? static_cast<QelVidLayGrid*>(part.get()) : nullptr;
   for (size_t i = 0; i < compiled.children.size(); ++i) {
     QelVar<QelVidWidget> child = BuildParts(compiled.children[i], parts, router);
     if (grid && compiled.cells[i]) grid->AddWidget(child.get(), *compiled.cells[i]);

@@ -71,7 +71,7 @@ QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
 
 void QelVidWidget::SetAttribute(const std::string& name, const QelSYPValue& value) {
   if (Attributes::Entry* found = attributes_.Find(name)) found->second = value;
-  else attributes_.Append({name, value});
+  else attributes_.Append(name, value);
   OnAttributeChanged(name);
 }
 
@@ -81,7 +81,7 @@ void QelVidWidget::InitAttributes(const std::vector<std::pair<std::string, QelSY
     return;
   }
   attributes_.Reserve(initial.size() + more);
-  for (const auto& attribute : initial) attributes_.Append(attribute);
+  for (const auto& [name, value] : initial) attributes_.Append(name, value);
   for (const auto& attribute : initial) OnAttributeChanged(attribute.first);
 }
 
