@@ -179,7 +179,7 @@ HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* p
       continue;
     }
     grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
-    auto* childProperty = QelSysDynamicCast<QelRovFacetProperty>(child);
+    auto* childProperty = QelRovFacetProperty::From(child);
     if (childProperty && !childProperty->GetVisibleFlag()) {
       ++hidden;
       widget->SetVisibleFlag(0);
