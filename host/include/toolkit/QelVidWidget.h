@@ -5,10 +5,7 @@
 // dispatches events to its handlers and, for propagating events, to its ancestors'.
 // A dispatch holds every widget it will visit, so a handler may remove and release the
 // widget (or an ancestor) that is dispatching: it goes when the dispatch returns.
-#include <cstddef>
-#include <iterator>
 #include <string>
-#include <utility>
 #include <vector>
 
 #include "QelBaseUnknown_WR.h"
@@ -62,7 +59,7 @@ class QelVidWidget : public QelISYPIntrospectable {
   void SetAttribute(const std::string& name, const QelSYPValue& value);
   // Room for `count` attributes, for a maker that knows how many it will set: rows of
   // styled parts then carry no unused slots.
-  void ReserveAttributes(size_t count) { attributes_.Reserve(count); }
+  void ReserveAttributes(size_t count) { attributes_.reserve(count); }
   // A new part's attributes from its template, with room for `more` (its bindings). Each
   // is announced as SetAttribute would; the names are distinct.
   void InitAttributes(const std::vector<std::pair<std::string, QelSYPValue>>& initial, size_t more);
@@ -70,70 +67,7 @@ class QelVidWidget : public QelISYPIntrospectable {
   int IntAttribute(const std::string& name, int fallback) const;
   QelUnicodeString TextAttribute(const std::string& name) const;
   // In order of first setting.
-  // The first few live in the widget itself: a styled part carries one to three, so
-  // making one allocates none for them.
-  class Attributes {
-   public:
-    using Entry = std::pair<std::string, QelSYPValue>;
-    class const_iterator {
-     public:
-      using iterator_category = std::forward_iterator_tag;
-      using value_type = Entry;
-      using difference_type = std::ptrdiff_t;
-      using pointer = const Entry*;
-      using reference = const Entry&;
-      const_iterator() = default;
-      const_iterator(const Attributes* owner, size_t index) : owner_(owner), index_(index) {}
-      reference operator*() const { return owner_->At(index_); }
-      pointer operator->() const { return &owner_->At(index_); }
-      const_iterator& operator++() {
-        ++index_;
-        return *this;
-      }
-      const_iterator operator++(int) {
-        const_iterator old = *this;
-        ++index_;
-        return old;
-      }
-      bool operator==(const const_iterator& other) const { return index_ == other.index_; }
-
-     private:
-      const Attributes* owner_ = nullptr;
-      size_t index_ = 0;
-    };
-
-    size_t size() const { return localCount_ + more_.size(); }
-    bool empty() const { return localCount_ == 0; }
-    const_iterator begin() const { return {this, 0}; }
-    const_iterator end() const { return {this, size()}; }
-    const Entry& At(size_t index) const { return index < kLocal ? local_[index] : more_[index - kLocal]; }
-    Entry* Find(const std::string& name) {
-      for (size_t i = 0; i < localCount_; ++i)
-        if (local_[i].first == name) return &local_[i];
-      for (Entry& entry : more_)
-        if (entry.first == name) return &entry;
-      return nullptr;
-    }
-    const Entry* Find(const std::string& name) const { return const_cast<Attributes*>(this)->Find(name); }
-    void Append(const std::string& name, const QelSYPValue& value) {
-      if (localCount_ == kLocal) {
-        more_.emplace_back(name, value);
-        return;
-      }
-      Entry& entry = local_[localCount_++];
-      entry.first = name;
-      entry.second = value;
-    }
-    void Reserve(size_t count) {
-      if (count > kLocal) more_.reserve(count - kLocal);
-    }
-
-   private:
-    static constexpr size_t kLocal = 3;
-    Entry local_[kLocal];
-    size_t localCount_ = 0;
-    std::vector<Entry> more_;  // used once the local entries are all taken
-  };
+  using Attributes = std::vector<std::pair<std::string, QelSYPValue>>;
   const Attributes& GetAttributes() const { return attributes_; }
 
   // The resource name of the class at `level` (0: the class itself, 1: its base ...).

@@ -70,8 +70,11 @@ QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
 }
 
 void QelVidWidget::SetAttribute(const std::string& name, const QelSYPValue& value) {
-  if (Attributes::Entry* found = attributes_.Find(name)) found->second = value;
-  else attributes_.Append(name, value);
+  // Most widgets carry a handful: one allocation instead of a growth series.
+  if (attributes_.capacity() == 0) attributes_.reserve(4);
+  auto it = std::find_if(attributes_.begin(), attributes_.end(), [&](const auto& a) { return a.first == name; });
+  if (it == attributes_.end()) attributes_.emplace_back(name, value);
+  else it->second = value;
   OnAttributeChanged(name);
 }
 
@@ -80,14 +83,15 @@ void QelVidWidget::InitAttributes(const std::vector<std::pair<std::string, QelSY
     for (const auto& [name, value] : initial) SetAttribute(name, value);
     return;
   }
-  attributes_.Reserve(initial.size() + more);
-  for (const auto& [name, value] : initial) attributes_.Append(name, value);
+  attributes_.reserve(initial.size() + more);
+  attributes_.insert(attributes_.end(), initial.begin(), initial.end());
   for (const auto& attribute : initial) OnAttributeChanged(attribute.first);
 }
 
 const QelSYPValue* QelVidWidget::FindAttribute(const std::string& name) const {
-  const Attributes::Entry* found = attributes_.Find(name);
-  return found ? &found->second : nullptr;
+  for (const auto& [key, value] : attributes_)
+    if (key == name) return &value;
+  return nullptr;
 }
 
 QelSYPValue QelVidWidget::GetAttribute(const std::string& name) const {
