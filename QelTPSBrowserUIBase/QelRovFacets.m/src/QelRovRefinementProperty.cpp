@@ -248,14 +248,18 @@ QelSYPEvent* QelRovRefinementProperty::SendPropEvent() {
   return event;
 }
 
+// The palette's roles are fixed, so the blends every row shows are made once.
 QelVidColor QelRovRefinementProperty::GetLineColor() const {
   if (hovered_) return QelVidColor(106, 158, 190, 100);
-  return QelVidColor(alternate_ ? 0.1 : 0.0, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  static const QelVidColor plain(0.0, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  static const QelVidColor shaded(0.1, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  return alternate_ ? shaded : plain;
 }
 
 QelVidColor QelRovRefinementProperty::GetBorderColor() const {
   if (hovered_) return QelVidColor(33, 110, 159, 120);
-  return QelVidColor(0.0, 0, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  static const QelVidColor border(0.0, 0, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  return border;
 }
 
 int QelRovRefinementProperty::GetIconVisibility() const { return PropertyFactsStand() && !icon_.IsEmpty() ? 1 : 0; }
