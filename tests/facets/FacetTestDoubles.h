@@ -56,6 +56,7 @@ class TestFacet : public QelRovFacet {
 
   explicit TestFacet(QelBaseUnknown* group) : QelRovFacet(group) {}
   void Add(QelBaseUnknown* property) { PropertyList().Append(property); }
+  void Remove(QelBaseUnknown* property) { PropertyList().RemoveValue(property); }
   void Name(const char* name) { SetFacetName(QelUnicodeString(name)); }
 
   void Refresh() override { ++refreshes; }

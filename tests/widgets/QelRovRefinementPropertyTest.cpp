@@ -71,6 +71,14 @@ TEST_F(QelRovRefinementPropertyTest, PropertiesReadTheModelAndShowInTheParts) {
   EXPECT_EQ(boxRow->GetResourceFilename(0).Str(), "QelRovRefinementProperty");
   EXPECT_EQ(boxRow->GetResourceFilename(1).Str(), "QelVidCtl");
   EXPECT_EQ(capture.Count(), 0);
+
+  // A row that outlives its property shows nothing it read before and says it is gone.
+  facet->Remove(icon.get());
+  icon = nullptr;
+  EXPECT_EQ(std::get<int>(Read(iconRow, "IconVisibility")), 0);
+  EXPECT_EQ(std::get<QelUnicodeString>(Read(iconRow, "Icon")), QelUnicodeString());
+  EXPECT_EQ(std::get<int>(Read(iconRow, "CheckBoxVisibility")), 0);
+  EXPECT_EQ(capture.Count(kQelAssertKindPointer, kQelAssertNullHandler), 3);
 }
 
 TEST_F(QelRovRefinementPropertyTest, ClickOnACheckedRadioRaisesTheEventWhileThePropertyRefuses) {

@@ -122,7 +122,7 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
     }
     if (QelTkCheckPointer(propEvent, "i_pEvent")) widget->AddHandler(propEvent, forwarder_.get(), 0);
     grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
-    auto* facetProperty = QelSysDynamicCast<QelRovFacetProperty>(property);
+    auto* facetProperty = QelRovFacetProperty::From(property);
     if (facetProperty && !facetProperty->GetVisibleFlag()) {
       ++hidden;
       widget->SetVisibleFlag(0);

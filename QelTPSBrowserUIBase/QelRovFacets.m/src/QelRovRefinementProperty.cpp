@@ -44,8 +44,7 @@ QelRovRefinementProperty::QelRovRefinementProperty(QelVidWidget* parent, QelStri
   QelBaseUnknown_var hold;
   QelRovFacetProperty* resolved = ResolveProperty(hold);
   if (!resolved) return;
-  resolved->GetName(propertyName_);
-  resolved->IsChecked(checked_);
+  ReadPropertyFacts(resolved);
   QelListValQelBaseUnknown_var children;
   resolved->GetChildren(children);
   childCount_ = children.Size();
@@ -82,8 +81,7 @@ bool QelRovRefinementProperty::Renew(QelString name, QelBaseUnknown* property, b
   if (children.Size() > 0 || CountHandlers(SendPropEvent()) != 1) return false;
   if (!RemoveHandler(SendPropEvent(), oldForwarder)) return false;
   if (GetName() != name) SetName(std::move(name));
-  resolved->GetName(propertyName_);
-  resolved->IsChecked(checked_);
+  ReadPropertyFacts(resolved);
   childCount_ = 0;
   alternate_ = alternate;
   hovered_ = false;
@@ -110,6 +108,21 @@ QelRovFacetProperty* QelRovRefinementProperty::ResolveProperty(QelBaseUnknown_va
   QelRovFacetProperty* property = QelRovFacetProperty::From(hold.get());
   if (!property) QelAssertPointer();
   return property;
+}
+
+void QelRovRefinementProperty::ReadPropertyFacts(QelRovFacetProperty* property) {
+  property->GetName(propertyName_);
+  property->IsChecked(checked_);
+  radio_ = (property->GetFlags() & QelRovFacetProperty::FlagRadio) != 0;
+  icon_ = QelUnicodeString();
+  property->GetIconName(icon_);
+  factsRead_ = true;
+}
+
+bool QelRovRefinementProperty::PropertyFactsStand() const {
+  if (factsRead_ && property_.IsAlive()) return true;
+  QelBaseUnknown_var hold;
+  return ResolveProperty(hold) != nullptr && factsRead_;
 }
 
 void QelRovRefinementProperty::OnTemplateApplied() {
@@ -166,7 +179,7 @@ HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* p
       continue;
     }
     grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
-    auto* childProperty = QelSysDynamicCast<QelRovFacetProperty>(child);
+    auto* childProperty = QelRovFacetProperty::From(child);
     if (childProperty && !childProperty->GetVisibleFlag()) {
       ++hidden;
       widget->SetVisibleFlag(0);
@@ -235,17 +248,21 @@ QelSYPEvent* QelRovRefinementProperty::SendPropEvent() {
   return event;
 }
 
+// The palette's roles are fixed, so the blends every row shows are made once.
 QelVidColor QelRovRefinementProperty::GetLineColor() const {
   if (hovered_) return QelVidColor(106, 158, 190, 100);
-  return QelVidColor(alternate_ ? 0.1 : 0.0, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  static const QelVidColor plain(0.0, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  static const QelVidColor shaded(0.1, 150, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  return alternate_ ? shaded : plain;
 }
 
 QelVidColor QelRovRefinementProperty::GetBorderColor() const {
   if (hovered_) return QelVidColor(33, 110, 159, 120);
-  return QelVidColor(0.0, 0, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  static const QelVidColor border(0.0, 0, QelVidPalette::ColorRole(1), QelVidPalette::ColorRole(2));
+  return border;
 }
 
-int QelRovRefinementProperty::GetIconVisibility() const { return GetIcon().IsEmpty() ? 0 : 1; }
+int QelRovRefinementProperty::GetIconVisibility() const { return PropertyFactsStand() && !icon_.IsEmpty() ? 1 : 0; }
 
 int QelRovRefinementProperty::GetExpandedFlag() const {
   QelBaseUnknown_var hold;
@@ -255,30 +272,16 @@ int QelRovRefinementProperty::GetExpandedFlag() const {
   return expanded ? 1 : 0;
 }
 
-int QelRovRefinementProperty::GetCheckBoxVisibility() const {
-  QelBaseUnknown_var hold;
-  QelRovFacetProperty* property = ResolveProperty(hold);
-  if (!property) return 0;
-  return (property->GetFlags() & QelRovFacetProperty::FlagRadio) ? 0 : 1;
-}
+int QelRovRefinementProperty::GetCheckBoxVisibility() const { return PropertyFactsStand() && !radio_ ? 1 : 0; }
 
-int QelRovRefinementProperty::GetRadioVisibility() const {
-  QelBaseUnknown_var hold;
-  QelRovFacetProperty* property = ResolveProperty(hold);
-  if (!property) return 0;
-  return (property->GetFlags() & QelRovFacetProperty::FlagRadio) ? 1 : 0;
-}
+int QelRovRefinementProperty::GetRadioVisibility() const { return PropertyFactsStand() && radio_ ? 1 : 0; }
 
 int QelRovRefinementProperty::GetRangeButtonEnableFlag() const {
   return checked_ && !rangeApplied_ && (leftOperatorIndex_ == 0 || rightValue_ >= leftValue_) ? 1 : 0;
 }
 
 QelUnicodeString QelRovRefinementProperty::GetIcon() const {
-  QelBaseUnknown_var hold;
-  QelRovFacetProperty* property = ResolveProperty(hold);
-  QelUnicodeString icon;
-  if (property) property->GetIconName(icon);
-  return icon;
+  return PropertyFactsStand() ? icon_ : QelUnicodeString();
 }
 
 QelUnicodeString QelRovRefinementProperty::GetLeftValue() const {

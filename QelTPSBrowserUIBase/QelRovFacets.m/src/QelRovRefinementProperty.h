@@ -96,6 +96,10 @@ class QelRovRefinementProperty : public QelVidCtl {
   // The property, held for the caller; null after an assertion when it is gone
   // ("NULL handler") or no property.
   QelRovFacetProperty* ResolveProperty(QelBaseUnknown_var& hold) const;
+  // Whether the facts read from the property (`radio_`, `icon_`) stand; when the
+  // property is gone, reports it as ResolveProperty does.
+  bool PropertyFactsStand() const;
+  void ReadPropertyFacts(QelRovFacetProperty* property);
   HRESULT BuildSubPropertyWidgets(QelRovFacetProperty* property);
   HRESULT BuildRange(QelRovFacetProperty* property);
   void ReadEditor(QelSYPEventArgs* args, double& value);
@@ -103,6 +107,10 @@ class QelRovRefinementProperty : public QelVidCtl {
   QelBaseUnknown_WR property_;
   int childCount_ = 0;
   QelUnicodeString propertyName_;
+  // Read once per row: every binding of the row's template asks for them.
+  QelUnicodeString icon_;
+  bool radio_ = false;
+  bool factsRead_ = false;
   QelVidLayGrid* grid_ = nullptr;
   bool alternate_ = false;
   bool hovered_ = false;

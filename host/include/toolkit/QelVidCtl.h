@@ -23,7 +23,7 @@ class QelVidCtl : public QelVidWidget {
   // S_OK once the template is in place; E_FAIL after a reported refusal. `variant` is
   // reserved by the toolkit and must be empty.
   HRESULT SetCustomStyle(const QelString& sheet, const QelString& style, const QelString& variant);
-  const QelString& GetStyleName() const { return style_; }
+  const QelString& GetStyleName() const;
 
   // The part of the applied template with that name, or null.
   QelVidWidget* RetrieveSypNamedObject(const QelString& name) const;
@@ -45,6 +45,7 @@ class QelVidCtl : public QelVidWidget {
       std::string attribute;
       const QelSYPMetaClass::Property* property;  // owned by the class's table
     };
+    QelString style;  // the style the template came from
     size_t partCount = 0;
     std::vector<NamedPart> namedParts;
     std::vector<Binding> bindings;  // in the order they are read
@@ -64,7 +65,6 @@ class QelVidCtl : public QelVidWidget {
  private:
   void ClearTemplate();
 
-  QelString style_;
   std::shared_ptr<const TemplateIndex> index_;
   std::vector<QelVar<QelVidWidget>> parts_;
   QelVar<QelVidWidget> templateRoot_;

@@ -28,10 +28,15 @@ HRESULT QelVidCtl::SetCustomStyle(const QelString& sheet, const QelString& style
   const QelVidStyleSheet* loaded = QelVidStyleSheet::Load(sheet.Str(), style.Str());
   if (!loaded) return E_FAIL;
   if (QelFailed(loaded->Instantiate(this, style.Str()))) return E_FAIL;
-  style_ = style;
   OnTemplateApplied();
   DispatchModifyProperty("");
   return S_OK;
+}
+
+const QelString& QelVidCtl::GetStyleName() const {
+  // Kept with the shared template, so a control styled per row copies no style name.
+  static const QelString none;
+  return index_ ? index_->style : none;
 }
 
 QelVidWidget* QelVidCtl::RetrieveSypNamedObject(const QelString& name) const {
@@ -65,5 +70,4 @@ void QelVidCtl::ClearTemplate() {
   parts_.clear();
   if (templateRoot_) RemoveChild(templateRoot_.get());
   templateRoot_ = nullptr;
-  style_ = QelString();
 }

@@ -56,6 +56,7 @@ struct QelVidCompiledPart {
   };
   std::vector<Route> routes;
   std::vector<QelVidCompiledPart> children;
+  bool grid = false;  // a Grid places its children by `cells`
   std::vector<std::optional<QelVidGridConstraints>> cells;  // for a Grid's children
   std::unique_ptr<QelVidCompiledPart> header;
   std::unique_ptr<QelVidCompiledPart> body;
@@ -183,10 +184,12 @@ class TemplateCompiler {
   TemplateCompiler(const std::string& className, const QelSYPMetaClass* meta) : className_(className), meta_(meta) {}
 
   // The template's root, with the totals of the whole tree.
-  std::shared_ptr<QelVidCompiledPart> CompileTemplate(const json& node, const std::string& place) {
+  std::shared_ptr<QelVidCompiledPart> CompileTemplate(const json& node, const std::string& style,
+                                                      const std::string& place) {
     auto root = std::make_shared<QelVidCompiledPart>(Compile(node, place));
     root->handlerSlots = handlerNames_.size();
     root->index = std::make_shared<QelVidCtl::TemplateIndex>();
+    root->index->style = QelString(style);
     Number(*root, *root);
     return root;
   }
@@ -293,6 +296,7 @@ class TemplateCompiler {
     if (!it->is_array()) throw StyleError{place + "/children", "not a list"};
     if (expander) throw StyleError{place + "/children", "an Expander has a header and a body, not children"};
     const bool grid = part.kind == "Grid";
+    part.grid = grid;
     for (size_t i = 0; i < it->size(); ++i) {
       const std::string at = place + "/children/" + std::to_string(i);
       part.children.push_back(Compile((*it)[i], at));
@@ -390,7 +394,8 @@ QelVar<QelVidWidget> BuildParts(const QelVidCompiledPart& compiled, std::vector<
     }
   }
   if (compiled.children.empty()) return part;
-  auto* grid = dynamic_cast<QelVidLayGrid*>(part.get());
+  // The maker of a Grid part makes a QelVidLayGrid.
+  auto* grid = compiled.grid ? static_cast<QelVidLayGrid*>(part.get()) : nullptr;
   for (size_t i = 0; i < compiled.children.size(); ++i) {
     QelVar<QelVidWidget> child = BuildParts(compiled.children[i], parts, router);
     if (grid && compiled.cells[i]) grid->AddWidget(child.get(), *compiled.cells[i]);
@@ -485,7 +490,7 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
       if (!it->is_object() || !it->contains("template"))
         throw StyleError{"/styles/" + style, "a style is an object with a \"template\""};
       TemplateCompiler compiler(control->IsA(), meta);
-      compiled = compiler.CompileTemplate((*it)["template"], "/styles/" + style + "/template");
+      compiled = compiler.CompileTemplate((*it)["template"], style, "/styles/" + style + "/template");
     } catch (const StyleError& e) {
       document_->compiled.erase({style, meta});
       Report("style sheet " + path_ + ": style \"" + style + "\": at " + e.place + ": " + e.what);
