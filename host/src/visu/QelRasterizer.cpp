@@ -258,7 +258,7 @@ class LabelPlacer {
   struct Box {
     int left, top, w, h;
   };
-  LabelPlacer(int width, int height) : width_(width), height_(height), cols_(Cells(width)), rows_(Cells(height)) {
+  LabelPlacer(int width, int height) : width_(width), height_(height), cols_(CellCount(width)), rows_(CellCount(height)) {
     grid_.resize(static_cast<size_t>(cols_) * rows_);
   }
 
@@ -280,30 +280,34 @@ class LabelPlacer {
 
  private:
   static constexpr int kCell = 32, kSteps = 12;
-  static int Cells(int pixels) { return std::max(1, (pixels + kCell - 1) / kCell); }
+  static int CellCount(int pixels) { return std::max(1, (pixels + kCell - 1) / kCell); }
   bool Inside(const Box& b) const { return b.left >= 0 && b.top >= 0 && b.left + b.w <= width_ && b.top + b.h <= height_; }
   static bool Overlap(const Box& a, const Box& b) {
     return a.left < b.left + b.w && b.left < a.left + a.w && a.top < b.top + b.h && b.top < a.top + a.h;
   }
-  template <typename Fn>
-  void ForCells(const Box& b, Fn fn) const {
-    const int c0 = std::clamp(b.left / kCell, 0, cols_ - 1), c1 = std::clamp((b.left + b.w - 1) / kCell, 0, cols_ - 1);
-    const int r0 = std::clamp(b.top / kCell, 0, rows_ - 1), r1 = std::clamp((b.top + b.h - 1) / kCell, 0, rows_ - 1);
-    if (b.left + b.w <= 0 || b.top + b.h <= 0 || b.left >= width_ || b.top >= height_) return;
-    for (int r = r0; r <= r1; ++r)
-      for (int c = c0; c <= c1; ++c) fn(static_cast<size_t>(r) * cols_ + c);
+  // The cells under a box that lies at least partly in the picture: columns c0..c1, rows r0..r1.
+  bool Cells(const Box& b, int& c0, int& c1, int& r0, int& r1) const {
+    if (b.left + b.w <= 0 || b.top + b.h <= 0 || b.left >= width_ || b.top >= height_) return false;
+    c0 = std::clamp(b.left / kCell, 0, cols_ - 1), c1 = std::clamp((b.left + b.w - 1) / kCell, 0, cols_ - 1);
+    r0 = std::clamp(b.top / kCell, 0, rows_ - 1), r1 = std::clamp((b.top + b.h - 1) / kCell, 0, rows_ - 1);
+    return true;
   }
   bool Free(const Box& b) const {
-    bool free = true;
-    ForCells(b, [&](size_t cell) {
-      for (const int i : grid_[cell]) free = free && !Overlap(b, boxes_[i]);
-    });
-    return free;
+    int c0, c1, r0, r1;
+    if (!Cells(b, c0, c1, r0, r1)) return true;
+    for (int r = r0; r <= r1; ++r)
+      for (int c = c0; c <= c1; ++c)
+        for (const int i : grid_[static_cast<size_t>(r) * cols_ + c])
+          if (Overlap(b, boxes_[i])) return false;
+    return true;
   }
   Box Mark(const Box& b) {
     boxes_.push_back(b);
     const int index = static_cast<int>(boxes_.size()) - 1;
-    ForCells(b, [&](size_t cell) { grid_[cell].push_back(index); });
+    int c0, c1, r0, r1;
+    if (Cells(b, c0, c1, r0, r1))
+      for (int r = r0; r <= r1; ++r)
+        for (int c = c0; c <= c1; ++c) grid_[static_cast<size_t>(r) * cols_ + c].push_back(index);
     return b;
   }
   int width_, height_, cols_, rows_;
