@@ -147,7 +147,7 @@ TEST(QelVidStyleSheet, TheSameFileNameInAnotherFolderIsThatFoldersSheet) {
 
 // A styled control's handlers are made on the first event of their name and kept for the
 // next; parts that outlive their control make none and call nothing.
-TEST(QelVidStyleSheet, HandlersAreMadeOnTheirFirstEventAndNeverForAGoneControl) {
+TEST(QelVidStyleSheet, RoutedHandlersLiveForTheirEventOnlyAndNeverReachAGoneControl) {
   StyleFolder folder;
   folder.Write("probe.sypstyle", kGoodSheet);
   auto probe = QelMakeVar<ProbeControl>();
@@ -159,20 +159,26 @@ TEST(QelVidStyleSheet, HandlersAreMadeOnTheirFirstEventAndNeverForAGoneControl) 
   auto* button = dynamic_cast<QelVidCtlButton*>(press.get());
   ASSERT_NE(button, nullptr);
 
+  // A second control of the style shares the first one's router: it costs its parts only.
   const int64_t styled = QelBaseUnknown::LiveObjectCount();
+  auto twin = QelMakeVar<ProbeControl>();
+  ASSERT_EQ(twin->SetCustomStyle(QelString("probe.sypstyle"), QelString("Main"), QelString("")), S_OK);
+  const int64_t parts = QelBaseUnknown::LiveObjectCount() - styled - 1;
+  twin = nullptr;
+
   EXPECT_TRUE(button->Click());
-  const int64_t afterFirst = QelBaseUnknown::LiveObjectCount();
-  EXPECT_EQ(afterFirst, styled + 1);  // the OnPress handler, nothing for OnEnter yet
   EXPECT_TRUE(button->Click());
   body->MouseEnter();
-  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), afterFirst + 1);
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), styled);
   EXPECT_EQ(probe->presses.size(), 2u);
   EXPECT_EQ(probe->enters, 1);
+  EXPECT_GT(parts, 1);
 
   probe = nullptr;  // the parts held here outlive their control
-  const int64_t gone = QelBaseUnknown::LiveObjectCount();
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), styled - 1);
   body->MouseEnter();
   button->Click();
-  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), gone);
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), styled - 1);
+  EXPECT_EQ(body->GetParent(), nullptr);
   EXPECT_TRUE(QelVidStyleSheet::TakeDiagnostics().empty());
 }

@@ -44,7 +44,34 @@ void Connect(QelVidWidget* w, QelSYPEvent* e, std::function<void(QelVidWidget*)>
   auto handler = QelMakeVar<Recorder>(std::move(f));
   EXPECT_EQ(w->AddHandler(e, handler.get(), 0), 1);
 }
+// Looks at its first child's parent from its own destructor, as a derived widget may.
+class WatchfulOwner final : public QelVidWidget {
+ public:
+  WatchfulOwner(QelVidWidget** seen) : QelVidWidget(nullptr, QelString("owner")), seen_(seen) {}
+
+ private:
+  ~WatchfulOwner() override { *seen_ = GetChild(0)->GetParent(); }
+  QelVidWidget** seen_;
+};
 }  // namespace
+
+TEST(QelVidWidgetDispatch, ParentLinksEndWhenTheParentGoesEvenForChildrenHeldElsewhere) {
+  QelVidWidget* seenWhileGoing = reinterpret_cast<QelVidWidget*>(1);
+  auto owner = QelMakeVar<WatchfulOwner>(&seenWhileGoing);
+  auto child = QelMakeVar<QelVidWidget>(nullptr, QelString("child"));
+  owner->AddChild(child.get());
+  EXPECT_EQ(child->GetParent(), owner.get());
+  owner = nullptr;
+  EXPECT_EQ(seenWhileGoing, nullptr);  // already during the owner's own destructor
+  EXPECT_EQ(child->GetParent(), nullptr);
+
+  // A parent only named at construction does not own the widget and may go first.
+  auto named = QelMakeVar<QelVidWidget>(nullptr, QelString("named"));
+  auto orphan = QelMakeVar<QelVidWidget>(named.get(), QelString("orphan"));
+  EXPECT_EQ(orphan->GetParent(), named.get());
+  named = nullptr;
+  EXPECT_EQ(orphan->GetParent(), nullptr);
+}
 
 TEST(QelVidWidgetDispatch, PropagatingEventReachesOwnHandlersThenEachAncestor) {
   Tree t;

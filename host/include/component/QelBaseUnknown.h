@@ -68,6 +68,10 @@ class QelBaseUnknown {
   // prove a scenario leaks nothing and leaves no cycle behind.
   static int64_t LiveObjectCount();
 
+  // True from the Release that drops the count to zero until the memory goes: lets an
+  // owner's raw back-links stop resolving before any destructor runs, as weak ones do.
+  bool IsBeingDestroyed() const { return refs_ >= kDestroying; }
+
  protected:
   QelBaseUnknown();
   virtual ~QelBaseUnknown();
@@ -82,6 +86,9 @@ class QelBaseUnknown {
   QelBaseUnknown* FindOrCreateExtension(const QelMetaObject& extension);
 
   struct Extensions;
+  // A count this high marks an object in destruction: a balanced AddRef/Release made by
+  // code the destructor calls cannot reach zero again and delete twice.
+  static constexpr uint32_t kDestroying = 1u << 30;
   uint32_t refs_ = 1;
   bool firstReferenceOwned_ = false;
   QelWeakFlag* weak_ = nullptr;

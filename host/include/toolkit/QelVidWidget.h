@@ -118,9 +118,13 @@ class QelVidWidget : public QelISYPIntrospectable {
   }
 
   QelString name_;
-  QelBaseUnknown_WR parent_;
-  // The widget parent_ refers to, valid while parent_ resolves: spares a cast per look-up.
+  // The parent: the widget that lists this one among its children, or the one named at
+  // construction. An owner clears the link when it lets its children go, so a raw
+  // pointer is enough and a row of parts costs no weak flags; a parent only named is
+  // linked weakly, as it may go first.
   QelVidWidget* parentWidget_ = nullptr;
+  QelBaseUnknown_WR namedParent_;
+  bool ownedByParent_ = false;
   std::vector<QelVar<QelVidWidget>> children_;
   // A few per widget: a flat list is cheaper to build than a tree.
   Attributes attributes_;
@@ -133,4 +137,8 @@ class QelVidWidget : public QelISYPIntrospectable {
   std::vector<Connection> moreConnections_;
   QelVidPoint minimum_;
   bool layoutWhenUnvisible_ = true;
+  void Unlink() {
+    parentWidget_ = nullptr;
+    ownedByParent_ = false;
+  }
 };

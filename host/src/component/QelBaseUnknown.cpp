@@ -12,10 +12,6 @@
 
 namespace {
 int64_t g_liveObjects = 0;
-// A count this high marks an object in destruction: a balanced AddRef/Release made by
-// code the destructor calls cannot reach zero again and delete twice.
-constexpr uint32_t kDestroying = 1u << 30;
-
 // Counts, weak flags and observer lists assume one thread: the one that made the first
 // counted object. Debug builds turn that assumption into a check, so work handed to
 // another thread (a renderer, a server) that touches a counted object is reported

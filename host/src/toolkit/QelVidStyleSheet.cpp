@@ -52,7 +52,6 @@ struct QelVidCompiledPart {
   struct Route {
     QelSYPEvent* event;
     std::string handler;
-    size_t slot;  // among the template's distinct handler names, so one handler serves them all
   };
   std::vector<Route> routes;
   std::vector<QelVidCompiledPart> children;
@@ -62,13 +61,14 @@ struct QelVidCompiledPart {
   std::unique_ptr<QelVidCompiledPart> body;
   size_t number = 0;  // in the order parts are made: the part, its header, body, children
   // Kept on the root only: what every control of the style shares.
-  size_t handlerSlots = 0;
   struct NumberedRoute {
     size_t part;
     const Route* route;
   };
   std::vector<NumberedRoute> allRoutes;
   std::shared_ptr<QelVidCtl::TemplateIndex> index;
+  // The router every control of the style shares, while one lives (controls hold it).
+  mutable QelBaseUnknown_WR router;
 };
 
 // Orders (style, class) keys and lets a look-up use the style name as it comes, without
@@ -187,7 +187,6 @@ class TemplateCompiler {
   std::shared_ptr<QelVidCompiledPart> CompileTemplate(const json& node, const std::string& style,
                                                       const std::string& place) {
     auto root = std::make_shared<QelVidCompiledPart>(Compile(node, place));
-    root->handlerSlots = handlerNames_.size();
     root->index = std::make_shared<QelVidCtl::TemplateIndex>();
     root->index->style = QelString(style);
     Number(*root, *root);
@@ -275,10 +274,7 @@ class TemplateCompiler {
       if (!meta_->FindHandler(handler.get<std::string>()))
         throw StyleError{at, "the class " + meta_->GetClassName() + " has no handler \"" +
                                  handler.get<std::string>() + "\""};
-      const std::string& handlerName = handler.get<std::string>();
-      auto slot = std::find(handlerNames_.begin(), handlerNames_.end(), handlerName);
-      if (slot == handlerNames_.end()) slot = handlerNames_.insert(handlerNames_.end(), handlerName);
-      part.routes.push_back({event, handlerName, static_cast<size_t>(slot - handlerNames_.begin())});
+      part.routes.push_back({event, handler.get<std::string>()});
     }
   }
 
@@ -328,37 +324,29 @@ class TemplateCompiler {
   std::string className_;
   const QelSYPMetaClass* meta_;
   std::vector<std::string> names_;
-  std::vector<std::string> handlerNames_;
 };
 
-// The one handler of a styled control: it serves every route of the control's template,
-// finding the route of an event by the part that raised it, and makes the handler of a
-// name the first time one of its events comes. Rows that are never clicked or hovered
-// thus cost one small counted object instead of one per handler name. It holds the
-// control weakly, like the handlers it makes.
+// The one handler of every control of a style: it finds the control of an event by
+// walking up from the part that raised it, and the route by that part's number, then
+// makes the handler of the route's name for that call. A row that is never clicked or
+// hovered thus costs no handler and no reference of its own.
 class QelVidRouteHandler final : public QelSYPEventHandler {
  public:
-  QelVidRouteHandler(QelVidCtl* control, const QelSYPMetaClass* meta,
-                     std::shared_ptr<const QelVidCompiledPart> compiled)
-      : control_(static_cast<QelBaseUnknown*>(control)), meta_(meta), compiled_(std::move(compiled)) {}
+  QelVidRouteHandler(const QelSYPMetaClass* meta, std::shared_ptr<const QelVidCompiledPart> compiled)
+      : meta_(meta), compiled_(std::move(compiled)) {}
 
   void HandleEvent(QelVidWidget* current, QelBaseUnknown* args) override {
     auto* eventArgs = dynamic_cast<QelSYPEventArgs*>(args);
     QelSYPEvent* event = eventArgs ? eventArgs->GetEvent() : nullptr;
-    QelBaseUnknown_var held = control_.Get();
-    auto* control = dynamic_cast<QelVidCtl*>(held.get());
-    // A control styled again has other parts: this router's routes no longer apply.
-    if (!control || control->GetTemplateIndex() != compiled_->index.get()) return;
+    if (!event || !current) return;
     for (const QelVidCompiledPart::NumberedRoute& numbered : compiled_->allRoutes) {
-      if (numbered.route->event != event || control->GetTemplatePart(numbered.part) != current) continue;
-      if (handlers_.empty()) handlers_.resize(compiled_->handlerSlots);
-      Slot& slot = handlers_[numbered.route->slot];
-      if (!slot.made) {
-        slot.made = true;
-        slot.handler = QelVar<QelSYPEventHandler>::Adopt(meta_->CreateHandler(held.get(), numbered.route->handler));
-      }
-      // Held: the handler may rebuild the control, and with it this router's owners.
-      if (QelVar<QelSYPEventHandler> handler = slot.handler) handler->HandleEvent(current, args);
+      if (numbered.route->event != event) continue;
+      QelVidCtl* control = ControlOf(current, numbered.part);
+      if (!control) continue;
+      // Held: the handler may rebuild the control, and with it the part's owners.
+      QelBaseUnknown_var held = QelBaseUnknown_var::Retain(control);
+      auto handler = QelVar<QelSYPEventHandler>::Adopt(meta_->CreateHandler(held.get(), numbered.route->handler));
+      if (handler) handler->HandleEvent(current, args);
       return;
     }
   }
@@ -367,15 +355,19 @@ class QelVidRouteHandler final : public QelSYPEventHandler {
   ~QelVidRouteHandler() override = default;
 
  private:
-  struct Slot {
-    bool made = false;
-    QelVar<QelSYPEventHandler> handler;
-  };
+  // The control whose part `number` is `part`. A control styled again has other parts, and
+  // a part taken out of its control has no such ancestor: their routes no longer apply.
+  QelVidCtl* ControlOf(QelVidWidget* part, size_t number) const {
+    for (QelVidWidget* up = part->GetParent(); up; up = up->GetParent()) {
+      auto* control = dynamic_cast<QelVidCtl*>(up);
+      if (control && control->GetTemplateIndex() == compiled_->index.get() && control->GetTemplatePart(number) == part)
+        return control;
+    }
+    return nullptr;
+  }
 
-  QelBaseUnknown_WR control_;
   const QelSYPMetaClass* meta_;
   std::shared_ptr<const QelVidCompiledPart> compiled_;
-  std::vector<Slot> handlers_;  // one per handler name, made with the first event
 };
 
 // Makes the widgets of a compiled template for a control, each at its number in `parts`.
@@ -503,7 +495,15 @@ HRESULT QelVidStyleSheet::Instantiate(QelVidCtl* control, const std::string& sty
   }
   std::shared_ptr<const QelVidCompiledPart> held = compiled;  // the map may change below
   QelVar<QelVidRouteHandler> router;
-  if (!held->allRoutes.empty()) router = QelMakeVar<QelVidRouteHandler>(control, meta, held);
+  if (!held->allRoutes.empty()) {
+    // The weak link only ever refers to a router.
+    if (QelBaseUnknown_var shared = held->router.Get()) {
+      router = QelVar<QelVidRouteHandler>::Retain(static_cast<QelVidRouteHandler*>(shared.get()));
+    } else {
+      router = QelMakeVar<QelVidRouteHandler>(meta, held);
+      held->router = QelBaseUnknown_WR(router.get());
+    }
+  }
   std::vector<QelVar<QelVidWidget>> parts(held->index->partCount);
   QelVar<QelVidWidget> root = BuildParts(*held, parts, router.get());
   control->SetTemplate(root.get(), held->index, std::move(parts));

@@ -15,16 +15,24 @@ const QelMetaObject& QelVidWidget::MetaObject() {
 const QelMetaObject* QelVidWidget::GetMetaObject() const { return &MetaObject(); }
 
 QelVidWidget::QelVidWidget(QelVidWidget* parent, QelString name)
-    : name_(std::move(name)), parent_(parent), parentWidget_(parent) {}
+    : name_(std::move(name)), parentWidget_(parent), namedParent_(parent) {}
 
-QelVidWidget::~QelVidWidget() = default;
+QelVidWidget::~QelVidWidget() {
+  // A child someone else still holds must not reach this widget once its memory is gone.
+  for (const auto& child : children_)
+    if (child->parentWidget_ == this) child->Unlink();
+}
 
 void* QelVidWidget::QueryDirect(const QelIID& iid) {
   if (void* mine = QelQueryDirect<QelISYPIntrospectable>(this, iid)) return mine;
   return QelBaseUnknown::QueryDirect(iid);
 }
 
-QelVidWidget* QelVidWidget::GetParent() const { return parent_.GetRaw() ? parentWidget_ : nullptr; }
+QelVidWidget* QelVidWidget::GetParent() const {
+  if (!parentWidget_) return nullptr;
+  if (ownedByParent_) return parentWidget_->IsBeingDestroyed() ? nullptr : parentWidget_;
+  return namedParent_.GetRaw() ? parentWidget_ : nullptr;
+}
 
 QelVidWidget* QelVidWidget::GetChild(int index) const {
   return index >= 0 && index < GetChildCount() ? children_[index].get() : nullptr;
@@ -34,8 +42,9 @@ void QelVidWidget::AddChild(QelVidWidget* child) {
   if (!child || child == this) return;
   QelVar<QelVidWidget> keep = QelVar<QelVidWidget>::Retain(child);
   if (QelVidWidget* old = child->GetParent()) old->RemoveChild(child);
-  child->parent_ = QelBaseUnknown_WR(this);
+  child->namedParent_.Reset();
   child->parentWidget_ = this;
+  child->ownedByParent_ = true;
   if (children_.empty()) children_.reserve(4);
   children_.push_back(std::move(keep));
 }
@@ -46,18 +55,14 @@ bool QelVidWidget::RemoveChild(QelVidWidget* child) {
   // Keep the child until the list no longer refers to it: its destructor may look around.
   QelVar<QelVidWidget> leaving = std::move(*it);
   children_.erase(it);
-  leaving->parent_.Reset();
-  leaving->parentWidget_ = nullptr;
+  leaving->Unlink();
   return true;
 }
 
 std::vector<QelVar<QelVidWidget>> QelVidWidget::TakeChildren() {
   std::vector<QelVar<QelVidWidget>> taken = std::move(children_);
   children_.clear();
-  for (const auto& child : taken) {
-    child->parent_.Reset();
-    child->parentWidget_ = nullptr;
-  }
+  for (const auto& child : taken) child->Unlink();
   return taken;
 }
 
