@@ -42,7 +42,7 @@ class QelVidCtl : public QelVidWidget {
     };
     struct Binding {
       size_t part;
-      std::string attribute;
+      const std::string* attribute;  // from QelVidAttributeName
       const QelSYPMetaClass::Property* property;  // owned by the class's table
     };
     QelString style;  // the style the template came from

@@ -9,6 +9,7 @@
 #include <vector>
 
 #include "QelBaseUnknown_WR.h"
+#include "QelVidAttributeList.h"
 #include "QelISYPIntrospectable.h"
 #include "QelMetaObject.h"
 #include "QelSYPEvent.h"
@@ -57,18 +58,16 @@ class QelVidWidget : public QelISYPIntrospectable {
 
   // Attributes: what a style sets or binds. Kinds react to theirs in OnAttributeChanged.
   void SetAttribute(const std::string& name, const QelSYPValue& value);
-  // Room for `count` attributes, for a maker that knows how many it will set: rows of
-  // styled parts then carry no unused slots.
-  void ReserveAttributes(size_t count) { attributes_.reserve(count); }
+  // The same by the name's one copy (QelVidAttributeName), as a compiled style binds.
+  void SetAttribute(const std::string* name, const QelSYPValue& value);
   // A new part's attributes from its template, with room for `more` (its bindings). Each
   // is announced as SetAttribute would; the names are distinct.
-  void InitAttributes(const std::vector<std::pair<std::string, QelSYPValue>>& initial, size_t more);
+  void InitAttributes(const std::vector<QelVidAttribute>& initial, size_t more);
   QelSYPValue GetAttribute(const std::string& name) const;
   int IntAttribute(const std::string& name, int fallback) const;
   QelUnicodeString TextAttribute(const std::string& name) const;
   // In order of first setting.
-  using Attributes = std::vector<std::pair<std::string, QelSYPValue>>;
-  const Attributes& GetAttributes() const { return attributes_; }
+  const QelVidAttributeList& GetAttributes() const { return attributes_; }
 
   // The resource name of the class at `level` (0: the class itself, 1: its base ...).
   virtual QelString GetResourceFilename(int level) const;
@@ -127,8 +126,7 @@ class QelVidWidget : public QelISYPIntrospectable {
   bool ownedByParent_ = false;
   std::vector<QelVar<QelVidWidget>> children_;
   // A few per widget: a flat list is cheaper to build than a tree.
-  Attributes attributes_;
-  const QelSYPValue* FindAttribute(const std::string& name) const;
+  QelVidAttributeList attributes_;
   // A styled part has one or two handlers: those live in the widget, without a list of
   // their own.
   static constexpr size_t kOwnConnections = 2;

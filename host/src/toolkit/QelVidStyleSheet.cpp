@@ -43,9 +43,9 @@ struct QelVidCompiledPart {
   std::string kind;
   Maker make = nullptr;  // resolved from the kind once
   QelString name;
-  std::vector<std::pair<std::string, QelSYPValue>> attributes;
+  std::vector<QelVidAttribute> attributes;
   struct Binding {
-    std::string attribute;
+    const std::string* attribute;  // from QelVidAttributeName
     const QelSYPMetaClass::Property* property;
   };
   std::vector<Binding> bindings;
@@ -222,7 +222,8 @@ class TemplateCompiler {
     if (auto it = node.find("attributes"); it != node.end()) {
       if (!it->is_object()) throw StyleError{place + "/attributes", "not an object"};
       for (const auto& [attribute, value] : it->items())
-        part.attributes.emplace_back(attribute, AttributeValue(value, place + "/attributes/" + attribute));
+        part.attributes.push_back(
+            {QelVidAttributeName(attribute), AttributeValue(value, place + "/attributes/" + attribute)});
     }
     if (auto it = node.find("bind"); it != node.end()) BindAll(*it, part, place + "/bind");
     if (auto it = node.find("on"); it != node.end()) RouteAll(*it, sample.get(), part, place + "/on");
@@ -258,7 +259,7 @@ class TemplateCompiler {
       if (!found)
         throw StyleError{at, "the class " + meta_->GetClassName() + " has no property \"" +
                                  property.get<std::string>() + "\""};
-      part.bindings.push_back({attribute, found});
+      part.bindings.push_back({QelVidAttributeName(attribute), found});
     }
   }
 

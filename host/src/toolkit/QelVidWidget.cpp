@@ -75,42 +75,34 @@ QelVidWidget* QelVidWidget::FindDescendant(const std::string& name) const {
 }
 
 void QelVidWidget::SetAttribute(const std::string& name, const QelSYPValue& value) {
-  // Most widgets carry a handful: one allocation instead of a growth series.
-  if (attributes_.capacity() == 0) attributes_.reserve(4);
-  auto it = std::find_if(attributes_.begin(), attributes_.end(), [&](const auto& a) { return a.first == name; });
-  if (it == attributes_.end()) attributes_.emplace_back(name, value);
-  else it->second = value;
+  if (QelSYPValue* found = attributes_.Find(std::string_view(name))) *found = value;
+  else attributes_.Append(QelVidAttributeName(name), value);
   OnAttributeChanged(name);
 }
 
-void QelVidWidget::InitAttributes(const std::vector<std::pair<std::string, QelSYPValue>>& initial, size_t more) {
-  if (!attributes_.empty()) {
-    for (const auto& [name, value] : initial) SetAttribute(name, value);
-    return;
-  }
-  attributes_.reserve(initial.size() + more);
-  attributes_.insert(attributes_.end(), initial.begin(), initial.end());
-  for (const auto& attribute : initial) OnAttributeChanged(attribute.first);
+void QelVidWidget::SetAttribute(const std::string* name, const QelSYPValue& value) {
+  if (QelSYPValue* found = attributes_.Find(name)) *found = value;
+  else attributes_.Append(name, value);
+  OnAttributeChanged(*name);
 }
 
-const QelSYPValue* QelVidWidget::FindAttribute(const std::string& name) const {
-  for (const auto& [key, value] : attributes_)
-    if (key == name) return &value;
-  return nullptr;
+void QelVidWidget::InitAttributes(const std::vector<QelVidAttribute>& initial, size_t more) {
+  attributes_.Reserve(attributes_.size() + initial.size() + more);
+  for (const QelVidAttribute& attribute : initial) SetAttribute(attribute.name, attribute.value);
 }
 
 QelSYPValue QelVidWidget::GetAttribute(const std::string& name) const {
-  const QelSYPValue* found = FindAttribute(name);
+  const QelSYPValue* found = attributes_.Find(std::string_view(name));
   return found ? *found : QelSYPValue();
 }
 
 int QelVidWidget::IntAttribute(const std::string& name, int fallback) const {
-  const QelSYPValue* found = FindAttribute(name);
+  const QelSYPValue* found = attributes_.Find(std::string_view(name));
   return found ? QelSYPValueToInt(*found, fallback) : fallback;
 }
 
 QelUnicodeString QelVidWidget::TextAttribute(const std::string& name) const {
-  const QelSYPValue* found = FindAttribute(name);
+  const QelSYPValue* found = attributes_.Find(std::string_view(name));
   if (!found) return {};
   if (const auto* text = std::get_if<QelUnicodeString>(found)) return *text;
   return QelUnicodeString(QelSYPValueToText(*found));

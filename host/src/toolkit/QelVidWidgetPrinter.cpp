@@ -189,13 +189,13 @@ void AppendWidget(QelVidWidget* w, std::string& id, std::string& out, const QelV
   key("attributes");
   out += '{';
   bool first = true;
-  for (const auto& [name, value] : w->GetAttributes()) {
-    if (name == "visible" || name == "enabled") continue;
+  for (const QelVidAttribute& attribute : w->GetAttributes()) {
+    if (attribute.Name() == "visible" || attribute.Name() == "enabled") continue;
     if (!first) out += ',';
     first = false;
-    AppendText(out, name);
+    AppendText(out, attribute.Name());
     out += ':';
-    AppendValue(out, value);
+    AppendValue(out, attribute.value);
   }
   out += '}';
   if (auto* expander = dynamic_cast<QelVidCtlExpander*>(w)) {
