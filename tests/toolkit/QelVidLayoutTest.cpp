@@ -88,3 +88,21 @@ TEST(QelVidControls, StateFromCodeRaisesNothingAndAPersonsActionRaisesItsEvent) 
   EXPECT_EQ(combo->GetSelectedIndex(), -1);
   EXPECT_EQ(counter->count, 5);
 }
+
+TEST(QelVidWidget, AttributesKeepTheirOrderAndValuesAcrossGrowth) {
+  auto w = QelMakeVar<QelVidWidget>(nullptr, QelString("w"));
+  w->SetAttribute("a", 1);
+  w->SetAttribute("b", QelUnicodeString("long enough to live outside a short string"));
+  w->SetAttribute("c", 2.5);
+  // The fourth attribute outgrows the room inside the widget while its value is read
+  // from one of the attributes that move.
+  w->SetAttribute("d", w->GetAttributes().begin()[1].value);
+  w->SetAttribute("a", 3);
+  std::string order;
+  for (const QelVidAttribute& attribute : w->GetAttributes()) order += attribute.Name();
+  EXPECT_EQ(order, "abcd");
+  EXPECT_EQ(w->IntAttribute("a", 0), 3);
+  EXPECT_EQ(w->TextAttribute("d"), QelUnicodeString("long enough to live outside a short string"));
+  EXPECT_EQ(w->TextAttribute("b"), w->TextAttribute("d"));
+  EXPECT_EQ(QelVidAttributeName("d"), w->GetAttributes().begin()[3].name);
+}
