@@ -100,6 +100,7 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
   forwarder_ = QelVar<QelSYPEventHandler>::Retain(forwarder.get());
   QelVar<QelSYPEventHandler> oldForwarder;
   std::vector<QelVar<QelVidWidget>> retired = TakeRetiredRows(hold.get(), oldForwarder);
+  grid_->Reserve(static_cast<size_t>(grid_->GetChildCount()) + static_cast<size_t>(n) + 1);  // the rows and the spacer
   int hidden = 0;
   for (int i = 1; i <= n; ++i) {
     QelBaseUnknown* property = properties[i].get();

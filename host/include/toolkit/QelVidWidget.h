@@ -102,6 +102,7 @@ class QelVidWidget : public QelISYPIntrospectable {
   // Detaches every child at once, handing them over in order: a layout giving up all its
   // widgets must not pay a search per widget.
   std::vector<QelVar<QelVidWidget>> TakeChildren();
+  void ReserveChildren(size_t count) { children_.reserve(count); }
   virtual void OnAttributeChanged(const std::string&) {}
 
  private:

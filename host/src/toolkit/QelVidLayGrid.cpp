@@ -18,6 +18,11 @@ int QelVidLayGrid::RemoveWidget(QelVidWidget* widget) {
   return 1;
 }
 
+void QelVidLayGrid::Reserve(size_t count) {
+  cells_.reserve(count);
+  ReserveChildren(count);
+}
+
 std::vector<QelVar<QelVidWidget>> QelVidLayGrid::TakeWidgets() {
   cells_.clear();
   return TakeChildren();
