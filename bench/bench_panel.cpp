@@ -119,4 +119,3 @@ BENCHMARK(BM_PanelLiveObjectsAfter1000Clicks)->Iterations(1)->Unit(benchmark::kM
 
 }  // namespace
 
-BENCHMARK_MAIN();

@@ -130,5 +130,3 @@ void BM_RebuildAfterClick(benchmark::State& state) {
 }
 BENCHMARK(BM_RebuildAfterClick)->RangeMultiplier(10)->Range(1000, 100000)->Unit(benchmark::kMillisecond)->Complexity(benchmark::oN);
 }  // namespace
-
-BENCHMARK_MAIN();

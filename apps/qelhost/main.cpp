@@ -26,6 +26,7 @@
 #include "QelRovFacetServices.h"
 #include "QelSampleProduct.h"
 #include "QelSettingRepository.h"
+#include "QelSysHeap.h"
 #include "QelWidgetsPreview.h"
 
 namespace {
@@ -157,6 +158,7 @@ int RunSession(const QelBaseUnknown_var& root, const QelHostOptions& options, vo
 }  // namespace
 
 int main(int argc, char** argv) {
+  QelSysKeepFreedHeap();
   if (QelWidgetsPreviewWanted(argc, argv)) return QelWidgetsPreviewMain(argc, argv);
   const SysLogNotice logNotice;
   QelHostOptions options;
