@@ -4,10 +4,15 @@
 
 #include "FacetTestDoubles.h"
 #include "QelAssert.h"
+#include "QelRovFacetPropertyGroup.h"
+#include "QelRovFacetPropertyItem.h"
 #include "QelRovRefinementDlg.h"
+#include "QelRovRefinementFacet.h"
+#include "QelRovRefinementProperty.h"
 #include "QelVidCtlButton.h"
 #include "QelVidCtlScrollableArea.h"
 #include "QelVidLayGrid.h"
+#include "QelVidWidgetPrinter.h"
 
 namespace {
 using DialogTest = PanelFixture;
@@ -55,6 +60,46 @@ TEST_F(DialogTest, AFailingSectionIsLeftOutAndRebuildsKeepTheScroll) {
   auto* refresh = dynamic_cast<QelVidCtlButton*>(dialog->RetrieveSypNamedObject(QelString("RefreshButton")));
   ASSERT_NE(refresh, nullptr);
   EXPECT_EQ(refresh->IsEnabled(), 0);  // the style binds it to the flag
+}
+
+// A rebuild after a click keeps, in every section, the rows it would make alike: plain
+// rows and the nested rows of a group, whose own row is made again.
+TEST_F(DialogTest, ARebuildKeepsTheRowsOfEverySectionItWouldMakeAlike) {
+  auto group = Make<TestFacetGroup>(editor.get());
+  auto plain = Make<TestFacet>(group.get());
+  auto grouped = Make<TestFacet>(group.get());
+  auto item = Make<QelRovFacetPropertyItem>(QelUnicodeString("item"), plain.get());
+  plain->Add(item.get());
+  auto kind = Make<QelRovFacetPropertyGroup>(QelUnicodeString("Kind"), QelUnicodeString(), grouped.get(), false);
+  auto a = Make<QelRovFacetPropertyItem>(QelUnicodeString("a"), kind.get());
+  auto b = Make<QelRovFacetPropertyItem>(QelUnicodeString("b"), kind.get());
+  kind->AddProperty(a.get());
+  kind->AddProperty(b.get());
+  grouped->Add(kind.get());
+  QelListValQelBaseUnknown_var facets;
+  facets.Append(static_cast<QelBaseUnknown*>(plain.get()));
+  facets.Append(static_cast<QelBaseUnknown*>(grouped.get()));
+  auto dialog = Make<QelRovRefinementDlg>(nullptr, QelString("QelRovRefinementDlg"), facets, editor.get());
+  ASSERT_EQ(dialog->BuildFacetWidgets(), S_OK);
+
+  auto firstRow = [&](int section) {
+    auto* widget = dynamic_cast<QelRovRefinementFacet*>(dialog->GetGrid()->GetWidgetsInRow(2 * section).at(0));
+    return dynamic_cast<QelRovRefinementProperty*>(widget->GetGrid()->GetWidgetsInRow(0).at(0));
+  };
+  auto rows = [&] {
+    QelRovRefinementProperty* kindRow = firstRow(1);
+    return std::vector<QelVidWidget*>{firstRow(0), kindRow, kindRow->GetGrid()->GetWidgetsInRow(0).at(0),
+                                      kindRow->GetGrid()->GetWidgetsInRow(1).at(0)};
+  };
+  const std::vector<QelVidWidget*> before = rows();
+  const std::string printed = QelVidPrintJson(dialog.get());
+  dialog->RefreshFacetWidgets();
+  const std::vector<QelVidWidget*> after = rows();
+  EXPECT_EQ(after[0], before[0]);
+  EXPECT_NE(after[1], before[1]);
+  EXPECT_EQ(after[2], before[2]);
+  EXPECT_EQ(after[3], before[3]);
+  EXPECT_EQ(QelVidPrintJson(dialog.get()), printed);
 }
 
 TEST_F(DialogTest, CloseReachesTheControllerEvenWithoutAFacetGroup) {

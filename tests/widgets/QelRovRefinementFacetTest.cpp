@@ -108,6 +108,15 @@ TEST_F(QelRovRefinementFacetTest, SubPropertiesGiveANamedExpanderWhoseClickReach
   EXPECT_EQ(rebuiltSecond->GetCheckState(), 1);
   EXPECT_TRUE(dynamic_cast<QelVidCtlExpander*>(rebuiltRow->RetrieveSypNamedObject(QelString("ExpanderProp")))
                   ->GetExpandedState());
+  // The group's row is new, its nested rows are the previous ones renewed, and the whole
+  // prints as a section made from nothing.
+  EXPECT_NE(rebuiltRow, row);
+  EXPECT_EQ(rebuiltSecond, body1);
+  EXPECT_EQ(QelVidPrintJson(panel->FacetWidget(0)), QelVidPrintJson(Build().get()));
+  // The renewed nested row's events climb through its new group row: one click, one rebuild.
+  EXPECT_TRUE(box->Click());
+  EXPECT_EQ(panel->rebuilds, rebuildsBefore + 2);
+  EXPECT_EQ(second->GetCheckState(), Unchecked);
   EXPECT_EQ(capture.Count(), 0);
 }
 

@@ -106,12 +106,16 @@ void QelRovRefinementDlg::RefreshFacetWidgets() {
   if (!grid_) return QelAssertPointer("DialogGrid");
   // Called from inside a section's own dispatch: the dispatch keeps it alive until it returns.
   QelVar<QelRovRefinementDlg> hold = QelVar<QelRovRefinementDlg>::Retain(this);
+  // The old sections stay alive, detached, until the new ones have taken over the rows
+  // they would make again.
+  std::vector<QelVar<QelVidWidget>> previous;
   for (const auto& widget : facetWidgets_) {
     auto* facetWidget = QelSysDynamicCast<QelVidWidget>(widget.get());
     if (!facetWidget) {
       QelAssertNullHandler();
       continue;
     }
+    previous.push_back(QelVar<QelVidWidget>::Retain(facetWidget));
     grid_->RemoveWidget(facetWidget);
   }
   for (const auto& spacer : spacers_) grid_->RemoveWidget(spacer.get());

@@ -109,14 +109,15 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
     rowName.resize(baseLength);
     rowName += std::to_string(i - 1);
     QelVar<QelRovRefinementProperty> widget;
+    QelRovRefinementProperty* previous = nullptr;
     if (static_cast<size_t>(i - 1) < retired.size()) {
-      QelRovRefinementProperty* row = QelRovRefinementProperty::From(retired[static_cast<size_t>(i - 1)].get());
-      if (row && row->Renew(QelString(rowName), property, alternate, oldForwarder.get()))
-        widget = QelVar<QelRovRefinementProperty>::Retain(row);
+      previous = QelRovRefinementProperty::From(retired[static_cast<size_t>(i - 1)].get());
+      if (previous && previous->Renew(QelString(rowName), property, alternate, oldForwarder.get()))
+        widget = QelVar<QelRovRefinementProperty>::Retain(previous);
     }
     if (!widget) {
       widget = QelMakeVar<QelRovRefinementProperty>(this, QelString(rowName), property, alternate);
-      if (QelFailed(widget->BuildContent())) {
+      if (QelFailed(widget->BuildContent(previous))) {
         QelAssertBool();
         continue;
       }

@@ -78,8 +78,8 @@ bool QelRovRefinementProperty::Renew(QelString name, QelBaseUnknown* property, b
   if (!resolved || (resolved->GetFlags() & QelRovFacetProperty::FlagValueRange)) return false;
   QelListValQelBaseUnknown_var children;
   resolved->GetChildren(children);
-  if (children.Size() > 0 || CountHandlers(SendPropEvent()) != 1) return false;
-  if (!RemoveHandler(SendPropEvent(), oldForwarder)) return false;
+  if (children.Size() > 0 || CountHandlers(SendPropEvent()) != (oldForwarder ? 1 : 0)) return false;
+  if (oldForwarder && !RemoveHandler(SendPropEvent(), oldForwarder)) return false;
   if (GetName() != name) SetName(std::move(name));
   ReadPropertyFacts(resolved);
   childCount_ = 0;
@@ -151,32 +151,48 @@ void QelRovRefinementProperty::OnTemplateApplied() {
   }
 }
 
-HRESULT QelRovRefinementProperty::BuildContent() {
+HRESULT QelRovRefinementProperty::BuildContent(QelRovRefinementProperty* previous) {
   QelBaseUnknown_var hold;
   QelRovFacetProperty* property = ResolveProperty(hold);
   if (!property) return E_UNEXPECTED;
-  if (kind_ == KindExpander) return BuildSubPropertyWidgets(property);
+  if (kind_ == KindExpander) return BuildSubPropertyWidgets(property, previous);
   if (kind_ == KindRange) return BuildRange(property);
   return S_OK;
 }
 
-HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* property) {
+HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* property,
+                                                          QelRovRefinementProperty* previous) {
   if (!grid_) {
     QelAssertPointer();
     return E_UNEXPECTED;
   }
   QelListValQelBaseUnknown_var children;
   property->GetChildren(children);
+  // The rows of the same property's previous expander, in order: a group of 10k
+  // annotations is then renewed after a click instead of made again.
+  std::vector<QelVar<QelVidWidget>> retired;
+  if (previous && previous != this && previous->kind_ == KindExpander && previous->grid_ &&
+      previous->property_.RefersTo(property))
+    retired = previous->grid_->TakeWidgets();
+  grid_->Reserve(static_cast<size_t>(children.Size()));
   const std::string baseName = propertyName_.Utf8() + "_Property";
   int hidden = 0;
   for (int i = 1; i <= children.Size(); ++i) {
     QelBaseUnknown* child = children[i].get();
     const bool alternate = (i - hidden) % 2 == 0;
-    QelVar<QelRovRefinementProperty> widget = QelMakeVar<QelRovRefinementProperty>(
-        this, QelString(baseName + std::to_string(i - 1)), child, alternate);
-    if (QelFailed(widget->BuildContent())) {
-      QelAssertBool();
-      continue;
+    QelString name(baseName + std::to_string(i - 1));
+    QelVar<QelRovRefinementProperty> widget;
+    QelRovRefinementProperty* old = nullptr;
+    if (static_cast<size_t>(i - 1) < retired.size()) {
+      old = From(retired[static_cast<size_t>(i - 1)].get());
+      if (old && old->Renew(name, child, alternate, nullptr)) widget = QelVar<QelRovRefinementProperty>::Retain(old);
+    }
+    if (!widget) {
+      widget = QelMakeVar<QelRovRefinementProperty>(this, std::move(name), child, alternate);
+      if (QelFailed(widget->BuildContent(old))) {
+        QelAssertBool();
+        continue;
+      }
     }
     grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
     auto* childProperty = QelRovFacetProperty::From(child);

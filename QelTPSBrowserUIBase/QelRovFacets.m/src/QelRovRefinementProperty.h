@@ -34,10 +34,13 @@ class QelRovRefinementProperty : public QelVidCtl {
   QelRovRefinementProperty(QelVidWidget* parent, QelString name, QelBaseUnknown* property, bool alternate);
 
   // Fills the kind's parts: the sub-property rows, or the range combos and values.
-  HRESULT BuildContent();
+  // `previous`, a row of the section this one replaces, lends its sub-property rows: those
+  // a new row would make alike are renewed in place.
+  HRESULT BuildContent(QelRovRefinementProperty* previous = nullptr);
   // Makes this check box or radio row what a new row named `name` over `property` would
   // be, for a section rebuilt after a change: texts, check state and colours read again,
-  // not hovered, and `oldForwarder` (its one SendPropEvent handler) disconnected. False,
+  // not hovered, and `oldForwarder` (its one SendPropEvent handler) disconnected; a
+  // sub-property row has no such handler and is renewed with a null one. False,
   // and the row left as it was, when a new row would differ otherwise (another property
   // or kind, attributes or handlers set on the row since it was made).
   bool Renew(QelString name, QelBaseUnknown* property, bool alternate, QelSYPEventHandler* oldForwarder);
@@ -100,7 +103,7 @@ class QelRovRefinementProperty : public QelVidCtl {
   // property is gone, reports it as ResolveProperty does.
   bool PropertyFactsStand() const;
   void ReadPropertyFacts(QelRovFacetProperty* property);
-  HRESULT BuildSubPropertyWidgets(QelRovFacetProperty* property);
+  HRESULT BuildSubPropertyWidgets(QelRovFacetProperty* property, QelRovRefinementProperty* previous);
   HRESULT BuildRange(QelRovFacetProperty* property);
   void ReadEditor(QelSYPEventArgs* args, double& value);
 
