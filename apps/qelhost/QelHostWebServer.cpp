@@ -232,6 +232,15 @@ void QelHostWebServer::Run(const volatile std::sig_atomic_t& stop) {
       job->done = true;
       done_.notify_all();
     }
+    // Idle once the answers are out: the picture their change made stale is drawn while the
+    // page reads them, rather than once the page asks for it.
+    lock.unlock();
+    try {
+      api_.PreparePicture();
+    } catch (const std::exception&) {
+      // The page's own request draws it again and says what failed.
+    }
+    lock.lock();
   }
 }
 
