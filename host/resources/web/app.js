@@ -110,7 +110,7 @@
       loadPicture();
     }
     $('status').classList.remove('error');
-    $('status').textContent = '';
+    setText($('status'), '');
     if (!keepPanel) drawPanel(state.panel);
     drawBrowser(state.browser);
     drawDisplay(state.display, state.changes);
@@ -119,15 +119,20 @@
     if (state.question) ask(state.question);
   }
 
+  // Texts are set only when they differ: an equal text set again still counts as a change
+  // for the page's layout and for a screen reader's live region.
+  function setText(node, text) {
+    if (node.textContent !== text) node.textContent = text;
+  }
+
   function drawDisplay(display, changes) {
-    $('display-summary').textContent = display
-      ? words.counts(display.shown, display.hidden) : '';
+    setText($('display-summary'), display ? words.counts(display.shown, display.hidden) : '');
     const parts = [];
     const list = (names) => (names.length > 6
       ? words.more(names.slice(0, 6).join(', '), names.length - 6) : names.join(', '));
     if (changes && changes.hidden && changes.hidden.length) parts.push(words.hidden(list(changes.hidden)));
     if (changes && changes.shown && changes.shown.length) parts.push(words.shown(list(changes.shown)));
-    $('changes').textContent = parts.join(' — ');
+    setText($('changes'), parts.join(' — '));
     $('changes').title = parts.join('\n');
   }
 
