@@ -373,25 +373,40 @@ QelHostWebReply QelHostWebApi::Activate(std::string_view body) {
 QelHostWebReply QelHostWebApi::Picture(int width, int height) {
   width = std::clamp(width, 64, 2048);
   height = std::clamp(height, 64, 2048);
-  Qel3DViewer* viewer = session_.Viewer();
-  if (!viewer) return Error(404, "no 3D viewer is open");
+  if (!session_.Viewer()) return Error(404, "no 3D viewer is open");
   if (picture_.empty() || pictureVersion_ != version_ || pictureWidth_ != width || pictureHeight_ != height) {
-    QelSupport* support = viewer->GetSupport();
-    support->SetSize(width, height);
-    viewer->PrepareViewpoint();
-    auto image = QelMakeVar<QelPixelImage>(width, height);
-    QelVar<QelOffscreenSupport> offscreen = createSupport(support, image.get());
-    std::string png;
-    if (!offscreen) return Error(500, "the viewer has no surface to draw");
-    offscreen->SetBackgroundColor(0.5f, 0.5f, 0.5f);
-    offscreen->SetTextSprites(1);
-    if (offscreen->Draw() != S_OK || !QelPngWriter::Encode(*image, png)) return Error(500, "the picture could not be made");
-    picture_ = std::move(png);
-    pictureVersion_ = version_;
-    pictureWidth_ = width;
-    pictureHeight_ = height;
+    if (std::string error = DrawPicture(width, height); !error.empty()) return Error(500, error);
   }
+  servedVersion_ = pictureVersion_;
   return {200, "image/png", picture_};
+}
+
+bool QelHostWebApi::PreparePicture() {
+  // One try per version: a picture that cannot be drawn is not tried again at every pause.
+  if (picture_.empty() || pictureVersion_ == version_ || servedVersion_ != pictureVersion_ ||
+      preparedVersion_ == version_ || !session_.Viewer())
+    return false;
+  preparedVersion_ = version_;
+  return DrawPicture(pictureWidth_, pictureHeight_).empty();
+}
+
+std::string QelHostWebApi::DrawPicture(int width, int height) {
+  Qel3DViewer* viewer = session_.Viewer();
+  QelSupport* support = viewer->GetSupport();
+  support->SetSize(width, height);
+  viewer->PrepareViewpoint();
+  auto image = QelMakeVar<QelPixelImage>(width, height);
+  QelVar<QelOffscreenSupport> offscreen = createSupport(support, image.get());
+  if (!offscreen) return "the viewer has no surface to draw";
+  offscreen->SetBackgroundColor(0.5f, 0.5f, 0.5f);
+  offscreen->SetTextSprites(1);
+  std::string png;
+  if (offscreen->Draw() != S_OK || !QelPngWriter::Encode(*image, png)) return "the picture could not be made";
+  picture_ = std::move(png);
+  pictureVersion_ = version_;
+  pictureWidth_ = width;
+  pictureHeight_ = height;
+  return {};
 }
 
 QelHostWebReply QelHostWebApi::Thumbnail(int item) {

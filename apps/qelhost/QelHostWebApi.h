@@ -45,6 +45,10 @@ class QelHostWebApi {
 
   // Grows whenever the picture would change.
   int PictureVersion() const { return version_; }
+  // Draws the picture a change made stale, at the size last asked for, so that it is ready
+  // when the page asks; called while no request waits. Only for a client that fetched the
+  // picture drawn before: one that never asks for pictures costs at most one. True when drawn.
+  bool PreparePicture();
 
  private:
   struct Changes {
@@ -62,6 +66,8 @@ class QelHostWebApi {
   bool Dispatch(const QelHostWebEvent& event, std::string& error);
   QelHostWebReply StateWith(const Changes& changes);
   std::string BrowserJson();
+  // Draws and encodes the picture for the current version; the reason when it cannot.
+  std::string DrawPicture(int width, int height);
   int ItemId(QelBaseUnknown* item);
 
   QelHostSession& session_;
@@ -84,5 +90,7 @@ class QelHostWebApi {
 
   int version_ = 1;
   int pictureVersion_ = 0, pictureWidth_ = 0, pictureHeight_ = 0;
+  int servedVersion_ = 0;    // of the picture last sent
+  int preparedVersion_ = 0;  // the last version PreparePicture tried
   std::string picture_;
 };

@@ -125,6 +125,9 @@ bool QelHostWebServer::Admit(const httplib::Request& request, httplib::Response&
 void QelHostWebServer::Routes() {
   httplib::Server& http = *http_;
   http.set_payload_max_length(QelHostWebRequest::kMaxBody);
+  // Headers and body go out as separate writes: without this the body waits for the
+  // client's delayed acknowledgement of the headers, some 40 ms on loopback.
+  http.set_tcp_nodelay(true);
   http.set_default_headers({{"X-Content-Type-Options", "nosniff"},
                             {"X-Frame-Options", "DENY"},
                             {"Referrer-Policy", "no-referrer"},
@@ -229,6 +232,15 @@ void QelHostWebServer::Run(const volatile std::sig_atomic_t& stop) {
       job->done = true;
       done_.notify_all();
     }
+    // Idle once the answers are out: the picture their change made stale is drawn while the
+    // page reads them, rather than once the page asks for it.
+    lock.unlock();
+    try {
+      api_.PreparePicture();
+    } catch (const std::exception&) {
+      // The page's own request draws it again and says what failed.
+    }
+    lock.lock();
   }
 }
 

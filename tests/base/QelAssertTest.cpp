@@ -59,8 +59,9 @@ TEST(QelAssertRoutine, OutsideDevelopmentLogsTheTextAndGoesOn) {
   EXPECT_EQ(logged, QelFormatAssertion(kQelAssertKindBool, "x", "QelAssertTest.cpp", line));
 }
 
-// A log file gets the reports appended (its folder made on the way); one that cannot be
-// written loses nothing: the report goes to standard error instead.
+// A log file gets the reports appended (its folder made on the way), and is made again when
+// removed meanwhile; one that cannot be written loses nothing: the report goes to standard
+// error instead.
 TEST(QelAssertRoutine, LogFileCollectsReportsAndAnUnwritableOneFallsBackToStandardError) {
   QelSetDevelopmentStage(false);
   const std::filesystem::path dir = std::filesystem::path(testing::TempDir()) / "qel-assert-log";
@@ -77,12 +78,19 @@ TEST(QelAssertRoutine, LogFileCollectsReportsAndAnUnwritableOneFallsBackToStanda
   EXPECT_NE(logged.str().find("first"), std::string::npos);
   EXPECT_NE(logged.str().find("second"), std::string::npos);
 
+  // Removed while the run goes on (a person clearing the log): the next report makes it again.
+  std::filesystem::remove(path);
+  QelAssertBool("after removal");
+  std::stringstream again;
+  again << std::ifstream(path).rdbuf();
+  EXPECT_NE(again.str().find("after removal"), std::string::npos);
+
   QelSetSysLogFile(dir.string());  // a folder: cannot be opened as a file
   testing::internal::CaptureStderr();
   QelAssertBool("third");
   EXPECT_NE(testing::internal::GetCapturedStderr().find("third"), std::string::npos);
   QelSetSysLogFile("");
-  EXPECT_EQ(QelSysLogCount(), before + 3);
+  EXPECT_EQ(QelSysLogCount(), before + 4);
   std::filesystem::remove_all(dir);
 }
 

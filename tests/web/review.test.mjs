@@ -150,7 +150,13 @@ async function reviewSample(page, url) {
     const box = rowInput(page, 'Shaft Inspection');
     if (!(await box.isChecked())) fail('the set "Shaft Inspection" starts unticked');
     const before = await pageState(page);
+    // One download of the new picture: the element that loaded it is the one shown.
+    const pictures = [];
+    const count = (request) => { if (request.url().includes('/api/picture.png')) pictures.push(request.url()); };
+    page.on('request', count);
     await settled(page, () => box.click());
+    page.off('request', count);
+    if (pictures.length !== 1) fail(`the picture was asked for ${pictures.length} times: ${pictures.join(', ')}`);
     const after = await pageState(page);
     if (await rowInput(page, 'Shaft Inspection').isChecked()) fail('the row is still ticked');
     if (!after.changes.startsWith('Hidden:')) fail(`the changes read "${after.changes}"`);

@@ -104,29 +104,35 @@
   // ---- State ----------------------------------------------------------------------------
 
   function apply(state, keepPanel = false) {
-    $('status').classList.remove('error');
-    $('status').textContent = '';
-    if (!keepPanel) drawPanel(state.panel);
-    drawBrowser(state.browser);
-    drawDisplay(state.display, state.changes);
+    // The picture is asked for first: the host renders it while the page draws the panel.
     if (state.picture && state.picture !== view.picture) {
       view.picture = state.picture;
       loadPicture();
     }
+    $('status').classList.remove('error');
+    setText($('status'), '');
+    if (!keepPanel) drawPanel(state.panel);
+    drawBrowser(state.browser);
+    drawDisplay(state.display, state.changes);
     view.serial += 1;
     document.body.dataset.serial = String(view.serial);
     if (state.question) ask(state.question);
   }
 
+  // Texts are set only when they differ: an equal text set again still counts as a change
+  // for the page's layout and for a screen reader's live region.
+  function setText(node, text) {
+    if (node.textContent !== text) node.textContent = text;
+  }
+
   function drawDisplay(display, changes) {
-    $('display-summary').textContent = display
-      ? words.counts(display.shown, display.hidden) : '';
+    setText($('display-summary'), display ? words.counts(display.shown, display.hidden) : '');
     const parts = [];
     const list = (names) => (names.length > 6
       ? words.more(names.slice(0, 6).join(', '), names.length - 6) : names.join(', '));
     if (changes && changes.hidden && changes.hidden.length) parts.push(words.hidden(list(changes.hidden)));
     if (changes && changes.shown && changes.shown.length) parts.push(words.shown(list(changes.shown)));
-    $('changes').textContent = parts.join(' — ');
+    setText($('changes'), parts.join(' — '));
     $('changes').title = parts.join('\n');
   }
 
@@ -384,7 +390,8 @@
 
     host.querySelectorAll('.scroll').forEach((area) => {
       const kept = scrolls.get(area.dataset.wid);
-      if (!kept) return;
+      // A new area starts at the top: setting nothing spares a layout in the middle of the draw.
+      if (!kept || (kept[0] === 0 && kept[1] === 0)) return;
       area.dataset.restoring = '1';
       area.scrollLeft = kept[0];
       area.scrollTop = kept[1];
@@ -479,13 +486,22 @@
 
   // ---- the picture ----------------------------------------------------------------------
 
+  // The box's size as last laid out, kept by its observer so that asking for a picture never
+  // makes the page lay itself out in the middle of drawing an answer.
+  const pictureBox = { width: 0, height: 0 };
   function pictureSize() {
-    const box = $('picture-box');
     const clamp = (v) => Math.max(64, Math.min(2048, Math.round(v)));
-    return [clamp(box.clientWidth), clamp(box.clientHeight)];
+    if (!pictureBox.width) {
+      const box = $('picture-box');
+      pictureBox.width = box.clientWidth;
+      pictureBox.height = box.clientHeight;
+    }
+    return [clamp(pictureBox.width), clamp(pictureBox.height)];
   }
 
-  // The newest picture replaces the old one only once it has arrived, so nothing flickers.
+  // The newest picture replaces the old one only once it has arrived, so nothing flickers; the
+  // element that loaded it is the one put in place, so it is loaded and decoded once. It is
+  // fetched, not left to an image element, which would start loading after the answer is drawn.
   function loadPicture() {
     if (!view.picture) return;
     const [w, h] = pictureSize();
@@ -493,18 +509,38 @@
     if (url === view.pictureWanted) return;
     view.pictureWanted = url;
     document.body.dataset.picture = 'loading';
-    const next = new Image();
-    next.onload = () => {
+    const headers = token ? { 'X-Qel-Token': token } : {};
+    let next = null;
+    fetch(url, { cache: 'no-store', headers }).then((response) => {
+      if (!response.ok) throw new Error(`${response.status}`);
+      return response.blob();
+    }).then((blob) => {
       if (view.pictureWanted !== url) return;
-      $('picture').src = url;
+      next = new Image();
+      return new Promise((resolve, reject) => {
+        next.onload = resolve;
+        next.onerror = reject;
+        next.src = URL.createObjectURL(blob);
+      });
+    }).then(() => {
+      if (!next) return;
+      if (view.pictureWanted !== url) {
+        URL.revokeObjectURL(next.src);
+        return;
+      }
+      const shown = $('picture');
+      next.id = shown.id;
+      next.alt = shown.alt;
+      next.draggable = false;
+      shown.replaceWith(next);
+      if (shown.src.startsWith('blob:')) URL.revokeObjectURL(shown.src);
       document.body.dataset.picture = 'ready';
-    };
-    next.onerror = () => {
+    }).catch(() => {
+      if (next) URL.revokeObjectURL(next.src);
       if (view.pictureWanted !== url) return;
       document.body.dataset.picture = 'failed';
       showError(new Error(words.noPicture));
-    };
-    next.src = url;
+    });
   }
 
   // Gestures pile up while a camera request is on its way and go as one.
@@ -581,7 +617,9 @@
     $('zoom-out').addEventListener('click', () => zoom(0.8));
     $('reframe').addEventListener('click', () => post('/api/camera', { reframe: true }, true));
     let resizeTimer = 0;
-    new ResizeObserver(() => {
+    new ResizeObserver(([entry]) => {
+      pictureBox.width = entry.target.clientWidth;
+      pictureBox.height = entry.target.clientHeight;
       clearTimeout(resizeTimer);
       resizeTimer = setTimeout(loadPicture, 150);
     }).observe(box);

@@ -1,5 +1,7 @@
 #include "QelAssert.h"
 
+#include <sys/stat.h>
+
 #include <cstdio>
 #include <cstdlib>
 #include <cstring>
@@ -12,6 +14,37 @@ int g_developmentStage = -1;  // -1: not decided yet, read from the environment
 QelAssertionCapture* g_capture = nullptr;
 std::string g_logFile;
 int g_logCount = 0;
+
+// The log file stays open between reports: a pass over thousands of annotations may report
+// each one, and opening the file for every line cost more than the pass itself. A file
+// removed or replaced meanwhile is opened anew, so later reports stay where people look.
+struct OpenLog {
+  std::FILE* file = nullptr;
+  dev_t device = 0;
+  ino_t inode = 0;
+
+  void Close() {
+    if (file) std::fclose(file);
+    file = nullptr;
+  }
+  std::FILE* For(const std::string& path) {
+    struct stat named = {};
+    if (file && (::stat(path.c_str(), &named) != 0 || named.st_dev != device || named.st_ino != inode)) Close();
+    if (file) return file;
+    file = std::fopen(path.c_str(), "a");
+    if (!file) {
+      std::error_code ignored;
+      std::filesystem::create_directories(std::filesystem::path(path).parent_path(), ignored);
+      file = std::fopen(path.c_str(), "a");
+    }
+    struct stat opened = {};
+    if (file && ::fstat(fileno(file), &opened) != 0) Close();
+    device = opened.st_dev;
+    inode = opened.st_ino;
+    return file;
+  }
+};
+OpenLog g_openLog;
 
 const char* BaseName(const char* path) {
   const char* slash = std::strrchr(path, '/');
@@ -50,22 +83,20 @@ void QelSetDevelopmentStage(bool on) { g_developmentStage = on ? 1 : 0; }
 void QelSysLogError(const char* text) {
   ++g_logCount;
   if (!g_logFile.empty()) {
-    std::FILE* file = std::fopen(g_logFile.c_str(), "a");
-    if (!file) {
-      std::error_code ignored;
-      std::filesystem::create_directories(std::filesystem::path(g_logFile).parent_path(), ignored);
-      file = std::fopen(g_logFile.c_str(), "a");
-    }
-    if (file) {
-      const bool written = std::fputs(text ? text : "", file) >= 0;
-      if (std::fclose(file) == 0 && written) return;
-    }
+    // Flushed at once: the report must be on disk if the run ends abnormally.
+    if (std::FILE* file = g_openLog.For(g_logFile);
+        file && std::fputs(text ? text : "", file) >= 0 && std::fflush(file) == 0)
+      return;
+    g_openLog.Close();
   }
   std::fputs(text ? text : "", stderr);
   std::fflush(stderr);
 }
 
-void QelSetSysLogFile(const std::string& path) { g_logFile = path; }
+void QelSetSysLogFile(const std::string& path) {
+  if (path != g_logFile) g_openLog.Close();
+  g_logFile = path;
+}
 const std::string& QelSysLogFile() { return g_logFile; }
 int QelSysLogCount() { return g_logCount; }
 
