@@ -59,9 +59,9 @@ TEST(QelAssertRoutine, OutsideDevelopmentLogsTheTextAndGoesOn) {
   EXPECT_EQ(logged, QelFormatAssertion(kQelAssertKindBool, "x", "QelAssertTest.cpp", line));
 }
 
-// A log file gets the reports appended (its folder made on the way), and is made again when
-// removed meanwhile; one that cannot be written loses nothing: the report goes to standard
-// error instead.
+// A log file gets the reports appended (its folder made on the way), a report repeated
+// at once as a count, and is made again when removed meanwhile; one that cannot be
+// written loses nothing: the report goes to standard error instead.
 TEST(QelAssertRoutine, LogFileCollectsReportsAndAnUnwritableOneFallsBackToStandardError) {
   QelSetDevelopmentStage(false);
   const std::filesystem::path dir = std::filesystem::path(testing::TempDir()) / "qel-assert-log";
@@ -70,13 +70,15 @@ TEST(QelAssertRoutine, LogFileCollectsReportsAndAnUnwritableOneFallsBackToStanda
   const int before = QelSysLogCount();
   QelSetSysLogFile(path);
   testing::internal::CaptureStderr();
-  QelAssertBool("first");
+  for (int i = 0; i < 3; ++i) QelAssertBool("first");  // the same report again: counted, not written
   QelAssertBool("second");
   EXPECT_EQ(testing::internal::GetCapturedStderr(), "");
   std::stringstream logged;
   logged << std::ifstream(path).rdbuf();
-  EXPECT_NE(logged.str().find("first"), std::string::npos);
-  EXPECT_NE(logged.str().find("second"), std::string::npos);
+  const size_t first = logged.str().find("first");
+  EXPECT_NE(first, std::string::npos);
+  EXPECT_EQ(logged.str().find("first", first + 1), std::string::npos);
+  EXPECT_LT(logged.str().find("(the report above 2 more times)"), logged.str().find("second"));
 
   // Removed while the run goes on (a person clearing the log): the next report makes it again.
   std::filesystem::remove(path);
@@ -90,7 +92,7 @@ TEST(QelAssertRoutine, LogFileCollectsReportsAndAnUnwritableOneFallsBackToStanda
   QelAssertBool("third");
   EXPECT_NE(testing::internal::GetCapturedStderr().find("third"), std::string::npos);
   QelSetSysLogFile("");
-  EXPECT_EQ(QelSysLogCount(), before + 4);
+  EXPECT_EQ(QelSysLogCount(), before + 6);
   std::filesystem::remove_all(dir);
 }
 

@@ -6,6 +6,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <filesystem>
+#include <string>
 #include <system_error>
 #include <utility>
 
@@ -80,21 +81,55 @@ bool QelDevelopmentStage() {
 
 void QelSetDevelopmentStage(bool on) { g_developmentStage = on ? 1 : 0; }
 
-void QelSysLogError(const char* text) {
-  ++g_logCount;
+namespace {
+// Reports the same as the one before (a refresh over 10k annotations may raise one per
+// annotation) are counted, not written; the count follows when another report comes, the
+// log changes or the process ends. The first of them is always written at once.
+std::string g_lastReport;
+int g_repeats = 0;
+
+void Write(const std::string& text) {
   if (!g_logFile.empty()) {
     // Flushed at once: the report must be on disk if the run ends abnormally.
     if (std::FILE* file = g_openLog.For(g_logFile);
-        file && std::fputs(text ? text : "", file) >= 0 && std::fflush(file) == 0)
+        file && std::fputs(text.c_str(), file) >= 0 && std::fflush(file) == 0)
       return;
     g_openLog.Close();
   }
-  std::fputs(text ? text : "", stderr);
+  std::fputs(text.c_str(), stderr);
   std::fflush(stderr);
 }
 
+std::string TakeRepeats() {
+  if (g_repeats == 0) return {};
+  std::string line = "   (the report above " + std::to_string(g_repeats) + " more time" + (g_repeats > 1 ? "s" : "") + ")\n";
+  g_repeats = 0;
+  return line;
+}
+
+struct RepeatsAtExit {
+  ~RepeatsAtExit() {
+    if (std::string repeats = TakeRepeats(); !repeats.empty()) Write(repeats);
+  }
+} g_repeatsAtExit;
+}  // namespace
+
+void QelSysLogError(const char* text) {
+  ++g_logCount;
+  std::string report = text ? text : "";
+  if (!report.empty() && report == g_lastReport) {
+    ++g_repeats;
+    return;
+  }
+  g_lastReport = report;
+  Write(TakeRepeats() + report);
+}
+
 void QelSetSysLogFile(const std::string& path) {
-  if (path != g_logFile) g_openLog.Close();
+  if (path == g_logFile) return;
+  if (std::string repeats = TakeRepeats(); !repeats.empty()) Write(repeats);
+  g_lastReport.clear();
+  g_openLog.Close();
   g_logFile = path;
 }
 const std::string& QelSysLogFile() { return g_logFile; }
