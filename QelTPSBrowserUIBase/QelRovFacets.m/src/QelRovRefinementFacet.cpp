@@ -108,28 +108,13 @@ HRESULT QelRovRefinementFacet::BuildPropertyWidgets() {
     const bool alternate = (i - hidden) % 2 == 0;
     rowName.resize(baseLength);
     rowName += std::to_string(i - 1);
-    QelVar<QelRovRefinementProperty> widget;
-    QelRovRefinementProperty* previous = nullptr;
-    if (static_cast<size_t>(i - 1) < retired.size()) {
-      previous = QelRovRefinementProperty::From(retired[static_cast<size_t>(i - 1)].get());
-      if (previous && previous->Renew(QelString(rowName), property, alternate, oldForwarder.get()))
-        widget = QelVar<QelRovRefinementProperty>::Retain(previous);
-    }
-    if (!widget) {
-      widget = QelMakeVar<QelRovRefinementProperty>(this, QelString(rowName), property, alternate);
-      if (QelFailed(widget->BuildContent(previous))) {
-        QelAssertBool();
-        continue;
-      }
-    }
+    QelVidWidget* previous =
+        static_cast<size_t>(i - 1) < retired.size() ? retired[static_cast<size_t>(i - 1)].get() : nullptr;
+    QelVar<QelRovRefinementProperty> widget = QelRovRefinementProperty::RenewOrMake(
+        this, QelString(rowName), property, alternate, previous, oldForwarder.get());
+    if (!widget) continue;
     if (QelTkCheckPointer(propEvent, "i_pEvent")) widget->AddHandler(propEvent, forwarder_.get(), 0);
-    grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
-    auto* facetProperty = QelRovFacetProperty::From(property);
-    if (facetProperty && !facetProperty->GetVisibleFlag()) {
-      ++hidden;
-      widget->SetVisibleFlag(0);
-      widget->SetLayoutWhenUnvisibleFlag(0);
-    }
+    if (QelRovRefinementProperty::PlaceRow(grid_, widget.get(), i - 1, property)) ++hidden;
   }
   // The spacer shares the last property's row. Without properties there is no such row:
   // the grid refuses row -1 and stays empty.

@@ -151,6 +151,30 @@ void QelRovRefinementProperty::OnTemplateApplied() {
   }
 }
 
+QelVar<QelRovRefinementProperty> QelRovRefinementProperty::RenewOrMake(QelVidWidget* parent, QelString name,
+                                                                       QelBaseUnknown* property, bool alternate,
+                                                                       QelVidWidget* previous,
+                                                                       QelSYPEventHandler* oldForwarder) {
+  QelRovRefinementProperty* old = previous ? From(previous) : nullptr;
+  if (old && old->Renew(name, property, alternate, oldForwarder)) return QelVar<QelRovRefinementProperty>::Retain(old);
+  auto row = QelMakeVar<QelRovRefinementProperty>(parent, std::move(name), property, alternate);
+  if (QelFailed(row->BuildContent(old))) {
+    QelAssertBool();
+    return nullptr;
+  }
+  return row;
+}
+
+bool QelRovRefinementProperty::PlaceRow(QelVidLayGrid* grid, QelRovRefinementProperty* row, int index,
+                                        QelBaseUnknown* property) {
+  grid->AddWidget(row, QelVidGridConstraints{0, index, 1, 1, 1, 1, 1, 0});
+  auto* facetProperty = QelRovFacetProperty::From(property);
+  if (!facetProperty || facetProperty->GetVisibleFlag()) return false;
+  row->SetVisibleFlag(0);
+  row->SetLayoutWhenUnvisibleFlag(0);
+  return true;
+}
+
 HRESULT QelRovRefinementProperty::BuildContent(QelRovRefinementProperty* previous) {
   QelBaseUnknown_var hold;
   QelRovFacetProperty* property = ResolveProperty(hold);
@@ -180,27 +204,10 @@ HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* p
   for (int i = 1; i <= children.Size(); ++i) {
     QelBaseUnknown* child = children[i].get();
     const bool alternate = (i - hidden) % 2 == 0;
-    QelString name(baseName + std::to_string(i - 1));
-    QelVar<QelRovRefinementProperty> widget;
-    QelRovRefinementProperty* old = nullptr;
-    if (static_cast<size_t>(i - 1) < retired.size()) {
-      old = From(retired[static_cast<size_t>(i - 1)].get());
-      if (old && old->Renew(name, child, alternate, nullptr)) widget = QelVar<QelRovRefinementProperty>::Retain(old);
-    }
-    if (!widget) {
-      widget = QelMakeVar<QelRovRefinementProperty>(this, std::move(name), child, alternate);
-      if (QelFailed(widget->BuildContent(old))) {
-        QelAssertBool();
-        continue;
-      }
-    }
-    grid_->AddWidget(widget.get(), QelVidGridConstraints{0, i - 1, 1, 1, 1, 1, 1, 0});
-    auto* childProperty = QelRovFacetProperty::From(child);
-    if (childProperty && !childProperty->GetVisibleFlag()) {
-      ++hidden;
-      widget->SetVisibleFlag(0);
-      widget->SetLayoutWhenUnvisibleFlag(0);
-    }
+    QelVidWidget* old = static_cast<size_t>(i - 1) < retired.size() ? retired[static_cast<size_t>(i - 1)].get() : nullptr;
+    QelVar<QelRovRefinementProperty> widget =
+        RenewOrMake(this, QelString(baseName + std::to_string(i - 1)), child, alternate, old, nullptr);
+    if (widget && PlaceRow(grid_, widget.get(), i - 1, child)) ++hidden;
   }
   return S_OK;
 }

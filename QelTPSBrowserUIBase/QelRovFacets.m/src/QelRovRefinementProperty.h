@@ -44,6 +44,16 @@ class QelRovRefinementProperty : public QelVidCtl {
   // and the row left as it was, when a new row would differ otherwise (another property
   // or kind, attributes or handlers set on the row since it was made).
   bool Renew(QelString name, QelBaseUnknown* property, bool alternate, QelSYPEventHandler* oldForwarder);
+  // The row for `property` at one place of a section or group, as a rebuild makes it:
+  // `previous` (the widget that stood there, or null) renewed when a new row would be
+  // alike, else a new row under `parent` whose content takes over `previous`'s nested rows.
+  // Null, after a report, when the new row's content cannot be built.
+  static QelVar<QelRovRefinementProperty> RenewOrMake(QelVidWidget* parent, QelString name, QelBaseUnknown* property,
+                                                      bool alternate, QelVidWidget* previous,
+                                                      QelSYPEventHandler* oldForwarder);
+  // Puts `row` in `grid` at `index`, hidden and taking no room when `property` is hidden;
+  // true then, so the caller's alternation skips it.
+  static bool PlaceRow(QelVidLayGrid* grid, QelRovRefinementProperty* row, int index, QelBaseUnknown* property);
   // Stores a pending valid range first, asks the property to change its check, then
   // raises SendPropEvent whatever the property answered.
   void SetChecked(int value);
