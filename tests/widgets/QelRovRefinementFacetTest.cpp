@@ -160,6 +160,21 @@ TEST_F(QelRovRefinementFacetTest, RebuildAfterAClickRenewsRowsInPlaceAndPrintsAs
   EXPECT_EQ(capture.Count(), 0);
 }
 
+// A row is renewed only while its property lives: a property made where a gone one lay
+// may have its address, and gets a new row of its own without a report.
+TEST_F(QelRovRefinementFacetTest, ARowWhosePropertyIsGoneIsMadeAgainNotRenewed) {
+  auto first = Add("first");
+  auto panel = Make<RebuildingPanel>(std::vector<QelBaseUnknown*>{facet.get()});
+  panel->Rebuild();
+  auto section = QelVar<QelVidWidget>::Retain(panel->FacetWidget(0));  // kept: the rebuild may take its rows
+  facet->Remove(first.get());
+  first = nullptr;
+  auto second = Add("second");
+  panel->Rebuild();
+  EXPECT_EQ(std::get<QelUnicodeString>(Read(Row(panel->FacetWidget(0), 0), "PropertyName")), QelUnicodeString("second"));
+  EXPECT_EQ(capture.Count(), 0);
+}
+
 TEST_F(QelRovRefinementFacetTest, FacetWithoutPropertiesIsEmptyAndAFacetThatIsGoneIsReported) {
   auto widget = Build();
   EXPECT_EQ(widget->GetGrid()->GetChildCount(), 0);

@@ -70,8 +70,9 @@ QelRovRefinementProperty::~QelRovRefinementProperty() = default;
 
 bool QelRovRefinementProperty::Renew(QelString name, QelBaseUnknown* property, bool alternate,
                                      QelSYPEventHandler* oldForwarder) {
-  if (kind_ != KindSingleElement || !property || !property_.RefersTo(property) || !GetAttributes().empty() ||
-      !GetLayoutWhenUnvisibleFlag() || GetStyleName().IsEmpty())
+  // Alive as well: a property made where a gone one lay has its address, not its identity.
+  if (kind_ != KindSingleElement || !property || !property_.IsAlive() || !property_.RefersTo(property) ||
+      !GetAttributes().empty() || !GetLayoutWhenUnvisibleFlag() || GetStyleName().IsEmpty())
     return false;
   QelBaseUnknown_var hold;
   QelRovFacetProperty* resolved = ResolveProperty(hold);
@@ -196,7 +197,7 @@ HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* p
   // annotations is then renewed after a click instead of made again.
   std::vector<QelVar<QelVidWidget>> retired;
   if (previous && previous != this && previous->kind_ == KindExpander && previous->grid_ &&
-      previous->property_.RefersTo(property))
+      previous->property_.IsAlive() && previous->property_.RefersTo(property))
     retired = previous->grid_->TakeWidgets();
   grid_->Reserve(static_cast<size_t>(children.Size()));
   const std::string baseName = propertyName_.Utf8() + "_Property";
