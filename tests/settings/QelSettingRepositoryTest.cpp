@@ -1,7 +1,9 @@
 #include "QelSettingRepository.h"
 
+#include <fcntl.h>
 #include <gtest/gtest.h>
 #include <signal.h>
+#include <sys/file.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -101,7 +103,9 @@ TEST_F(SettingRepositoryTest, SavedSettingsAreReadBackByAnotherProcess) {
   EXPECT_EQ(Probe("Tolerance", "int"), "absent") << "a double is not an int";
   EXPECT_TRUE(fs::directory_iterator(folder_) != fs::directory_iterator());
   for (const auto& entry : fs::directory_iterator(folder_))
-    EXPECT_EQ(entry.path().filename(), "QelRovDataFiltering.json") << "no temporary left behind";
+    EXPECT_TRUE(entry.path().filename() == "QelRovDataFiltering.json" ||
+                entry.path().filename() == "QelRovDataFiltering.json.lock")
+        << "no temporary left behind: " << entry.path().filename();
 }
 
 TEST_F(SettingRepositoryTest, SaveCreatesAMissingFolderAndWritesOnlyWhenModified) {
@@ -315,6 +319,50 @@ TEST_F(SettingRepositoryTest, SaveKeepsWhatAnotherProcessSavedMeanwhile) {
   int theirs = 0;
   EXPECT_EQ(repo->ReadSetting("theirs", theirs), S_OK) << "the save also refreshed this process's copy";
   EXPECT_EQ(theirs, 7);
+}
+
+TEST_F(SettingRepositoryTest, ProcessesSavingAtOnceKeepEachOthersSettings) {
+  // Eight processes started together per round, each saving a key of its own: without the
+  // lock the last rename of a round drops what the others merged.
+  constexpr int kProcesses = 8, kRounds = 6;
+  for (int round = 0; round < kRounds; ++round) {
+    std::string command = "for i in 0 1 2 3 4 5 6 7; do " + std::string(QEL_SETTINGS_PROBE) + " " + folder_ +
+                          " QelRovDataFiltering k_" + std::to_string(round) +
+                          "_$i int $i >/dev/null 2>&1 & done; wait";
+    ASSERT_EQ(std::system(command.c_str()), 0);
+  }
+  nlohmann::json saved = nlohmann::json::parse(ReadFile(FileOf()), nullptr, false);
+  ASSERT_TRUE(saved.is_object());
+  for (int round = 0; round < kRounds; ++round)
+    for (int i = 0; i < kProcesses; ++i) {
+      const std::string key = "k_" + std::to_string(round) + "_" + std::to_string(i);
+      EXPECT_EQ(saved.value(key, -1), i) << key << " was lost";
+    }
+  EXPECT_TRUE(fs::exists(FileOf().string() + ".lock")) << "the lock file stays, so every saver locks the same file";
+}
+
+TEST_F(SettingRepositoryTest, ALockHeldTooLongFailsTheSaveInTimeAndKeepsTheChangesForTheNext) {
+  QelSettingRepository* repo = Repo();
+  repo->WriteSetting("before", 1);
+  ASSERT_EQ(repo->SaveRepository(), S_OK);
+  QelSettingRepository::SetLockPatienceForTesting(std::chrono::milliseconds(200));
+  {
+    // Another holder of the lock: a second open file description conflicts even in this process.
+    const int holder = ::open((FileOf().string() + ".lock").c_str(), O_RDWR);
+    ASSERT_GE(holder, 0);
+    ASSERT_EQ(::flock(holder, LOCK_EX), 0);
+    repo->WriteSetting("pending", 2);
+    const auto start = std::chrono::steady_clock::now();
+    EXPECT_EQ(repo->SaveRepository(), E_FAIL);
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(3)) << "the wait has an end";
+    EXPECT_TRUE(repo->IsModified());
+    EXPECT_EQ(Probe("pending", "int"), "absent");
+    EXPECT_EQ(Probe("before", "int"), "1") << "the file is as it was";
+    ::close(holder);
+  }
+  QelSettingRepository::SetLockPatienceForTesting({});
+  EXPECT_EQ(repo->SaveRepository(), S_OK);
+  EXPECT_EQ(Probe("pending", "int"), "2");
 }
 
 TEST_F(SettingRepositoryTest, NumberOutOfRangeMakesTheFileCorruptAndItIsSetAsideWhole) {

@@ -8,6 +8,7 @@
 //   QelSettingRepository* repo = QelSettingRepository::GetRepository("QelRovDataFiltering");
 //   int on = 0;
 //   if (repo && repo->IsPresent("DataFilteringPanel_TPSCfg", "int")) repo->ReadSetting("DataFilteringPanel_TPSCfg", on);
+#include <chrono>
 #include <memory>
 #include <string>
 
@@ -73,7 +74,12 @@ class QelSettingRepository : public QelBaseUnknown {
   // with a logged reason, whenever any step of the write fails (the old file is then left
   // as it was, except after a failed folder sync, when the new file is in place but may
   // not survive a power cut). Temporaries left by a process killed mid-save are removed.
+  // Saving the own file holds its lock (<file>.lock) from the read to the rename, so that
+  // processes saving at once each keep the others' settings; a lock not had within five
+  // seconds fails the save, and the changes stay in memory for the next one.
   HRESULT SaveRepository(const char* path = nullptr);
+  // For tests: how long a save waits for the lock (zero or less: the five seconds again).
+  static void SetLockPatienceForTesting(std::chrono::milliseconds patience);
   bool IsModified() const;
   // True when the file exists but its settings could not be read (not a settings file, or
   // not readable): reads then answer as for an empty repository. Reported once, at load.

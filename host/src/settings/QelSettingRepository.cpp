@@ -15,6 +15,7 @@
 #include "QelAssert.h"
 #include "QelAtomicFile.h"
 #include "QelCallbackManager.h"
+#include "QelFileLock.h"
 #include "QelMetaObject.h"
 #include "QelSettingNotif.h"
 #include "QelVar.h"
@@ -409,7 +410,26 @@ bool WriteAtomically(const std::string& target, const std::string& text) {
 }
 }  // namespace
 
+namespace {
+constexpr std::chrono::milliseconds kLockPatience{5000};
+std::chrono::milliseconds lockPatience = kLockPatience;
+}  // namespace
+
+void QelSettingRepository::SetLockPatienceForTesting(std::chrono::milliseconds patience) {
+  lockPatience = patience.count() > 0 ? patience : kLockPatience;
+}
+
 HRESULT QelSettingRepository::State::SaveOwnFile() {
+  std::error_code ec;
+  if (fs::path folder = fs::path(path).parent_path(); !folder.empty()) fs::create_directories(folder, ec);
+  std::string error;
+  // Without the lock two processes would each merge into the file as it was before the
+  // other's rename, and the last rename would drop the other's settings.
+  const auto lock = QelFileLock::Acquire(path, lockPatience, error);
+  if (!lock) {
+    LogError("qel: settings not saved to '" + path + "': " + error + "; they are kept for the next save");
+    return E_FAIL;
+  }
   json current;
   std::string problem;
   switch (ReadSettingsFile(path, current, problem)) {
