@@ -181,3 +181,24 @@ TEST(QelPartPlacementTest, SamplePartsCarryTheirPlacements) {
     ExpectNear(t.Apply({1, 0, 0}), xUnitInRoot[i]);
   }
 }
+
+namespace {
+TEST(QelProductTreeTest, AProductChainFarDeeperThanFilesAllowIsReleasedWithoutRecursion) {
+  // Each level used to release the next from its destructor: 100,000 levels ran out of stack.
+  const int64_t liveBefore = QelBaseUnknown::LiveObjectCount();
+  {
+    QelModelBuilder builder;
+    QelBaseUnknown_var product = builder.Root();
+    for (int level = 0; level < 100000; ++level) product = builder.AddProduct(product, {.alias = "P"});
+    // A handle held on a deep product keeps that product, and only its subtree, alive.
+    QelBaseUnknown_var kept = product;
+    product = nullptr;
+    builder.Finish() = nullptr;
+    QelVar<QelIPLMNavOccurrence> deep{kept.get()};
+    ASSERT_TRUE(deep);
+    QelBaseUnknown_var father;
+    EXPECT_EQ(deep->GetFather(father), S_FALSE) << "its father went with the rest of the chain";
+  }
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), liveBefore);
+}
+}  // namespace

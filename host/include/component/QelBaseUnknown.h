@@ -71,6 +71,9 @@ class QelBaseUnknown {
   // True from the Release that drops the count to zero until the memory goes: lets an
   // owner's raw back-links stop resolving before any destructor runs, as weak ones do.
   bool IsBeingDestroyed() const { return refs_ >= kDestroying; }
+  // True when the caller's reference is the only one: releasing it would destroy the object.
+  // Lets an owner of a deep tree take a child's children before letting the child go.
+  bool HasOneReference() const { return refs_ == 1; }
 
  protected:
   QelBaseUnknown();

@@ -19,7 +19,18 @@ const char* QelPLMProductOccurrence::GetLateType() const { return "SorOccurrence
 
 QelPLMProductOccurrence::QelPLMProductOccurrence(std::string alias, std::string icon, bool shown)
     : QelModelObject(std::move(alias), std::move(icon), shown) {}
-QelPLMProductOccurrence::~QelPLMProductOccurrence() = default;
+QelPLMProductOccurrence::~QelPLMProductOccurrence() {
+  // A tree built through the API may be far deeper than the loaders allow: releasing it
+  // child by child would recurse once per level. A child about to go hands its own
+  // children over first, so each destructor below finds none and the stack stays flat.
+  std::vector<QelVar<QelPLMProductOccurrence>> pending = std::move(children_);
+  while (!pending.empty()) {
+    QelVar<QelPLMProductOccurrence> child = std::move(pending.back());
+    pending.pop_back();
+    if (child && child->HasOneReference())
+      for (auto& grandchild : child->children_) pending.push_back(std::move(grandchild));
+  }
+}
 
 void* QelPLMProductOccurrence::QueryDirect(const QelIID& iid) {
   if (void* mine = QelQueryDirect<QelIPLMNavOccurrence, QelILumLightLoadModeObservable>(this, iid)) return mine;
