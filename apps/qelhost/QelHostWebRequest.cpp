@@ -179,3 +179,34 @@ bool QelHostWebRequest::ParseActivate(std::string_view body, int& item, std::str
   json object;
   return ParseObject(body, object, error) && Integer(object, "item", 1, item, error);
 }
+
+std::vector<std::string> QelHostWebRequest::CookieValues(std::string_view header, std::string_view name) {
+  std::vector<std::string> values;
+  while (!header.empty()) {
+    const size_t end = header.find(';');
+    std::string_view pair = header.substr(0, end);
+    header = end == std::string_view::npos ? std::string_view() : header.substr(end + 1);
+    const size_t start = pair.find_first_not_of(' ');
+    if (start == std::string_view::npos) continue;
+    pair.remove_prefix(start);
+    const size_t equals = pair.find('=');
+    if (equals != std::string_view::npos && pair.substr(0, equals) == name)
+      values.emplace_back(pair.substr(equals + 1));
+  }
+  return values;
+}
+
+bool QelHostWebRequest::IsOwnOrigin(std::string_view origin, int port) {
+  const std::string suffix = ":" + std::to_string(port);
+  return origin == "http://127.0.0.1" + suffix || origin == "http://localhost" + suffix;
+}
+
+std::optional<size_t> QelHostWebRequest::ParseContentLength(std::string_view text) {
+  if (text.empty() || text.size() > 19) return std::nullopt;  // 19 digits always fit in 64 bits
+  size_t value = 0;
+  for (char c : text) {
+    if (c < '0' || c > '9') return std::nullopt;
+    value = value * 10 + static_cast<size_t>(c - '0');
+  }
+  return value;
+}

@@ -2,8 +2,10 @@
 // QelHostWebRequest: the JSON bodies the review page posts, read into plain values. Pure
 // parsing, no host object touched, so any thread may call it and the fuzz target can
 // drive it alone. Every refusal is one line a person can act on.
+#include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 struct QelHostWebEvent {
   enum class Type { Click, Text, Select, Expand, Collapse, Scroll };
@@ -30,4 +32,13 @@ bool ParseEvent(std::string_view body, QelHostWebEvent& event, std::string& erro
 bool ParseAnswer(std::string_view body, bool& yes, std::string& error);
 bool ParseCamera(std::string_view body, QelHostWebCamera& camera, std::string& error);
 bool ParseActivate(std::string_view body, int& item, std::string& error);
+
+// Every value of the cookie `name` in a Cookie header, in order: a browser sends one per
+// path and domain that matches, and an old server's may come first.
+std::vector<std::string> CookieValues(std::string_view header, std::string_view name);
+// True when `origin` (an Origin header) is this server's own page: http://127.0.0.1:PORT or
+// http://localhost:PORT. "null" and every other origin are foreign.
+bool IsOwnOrigin(std::string_view origin, int port);
+// The value of a Content-Length header: decimal digits only, no sign, no overflow.
+std::optional<size_t> ParseContentLength(std::string_view text);
 }  // namespace QelHostWebRequest

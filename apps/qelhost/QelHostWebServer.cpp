@@ -1,6 +1,7 @@
 #include "QelHostWebServer.h"
 
 #include <httplib.h>
+#include <sys/socket.h>
 
 #include <algorithm>
 #include <chrono>
@@ -14,12 +15,18 @@
 
 #include "QelDelayedDestruction.h"
 #include "QelHostSession.h"
+#include "QelHostWebRequest.h"
+#include "QelHostWebTaskQueue.h"
 #include "QelMsgCatalog.h"
 #include "QelSettingRepository.h"
 
 namespace {
 constexpr const char* kLoopback = "127.0.0.1";
 constexpr const char* kCookie = "qeltoken";
+// Connections get a worker each up to this many, so that idle or trickling sockets cannot
+// hold them all; a few stay warm for the page's next requests.
+constexpr size_t kWarmWorkers = 8, kMostWorkers = 512;
+constexpr std::chrono::seconds kWorkerLinger{10};
 
 volatile std::sig_atomic_t stopRequested = 0;
 extern "C" void RequestStop(int) { stopRequested = 1; }
@@ -30,17 +37,6 @@ bool SameSecret(const std::string& a, const std::string& b) {
   unsigned char diff = 0;
   for (size_t i = 0; i < a.size(); ++i) diff |= static_cast<unsigned char>(a[i] ^ b[i]);
   return diff == 0;
-}
-
-std::string CookieValue(const std::string& header, const std::string& name) {
-  std::istringstream cookies(header);
-  for (std::string pair; std::getline(cookies, pair, ';');) {
-    const size_t start = pair.find_first_not_of(' ');
-    if (start == std::string::npos) continue;
-    const size_t equals = pair.find('=', start);
-    if (equals != std::string::npos && pair.compare(start, equals - start, name) == 0) return pair.substr(equals + 1);
-  }
-  return {};
 }
 
 bool IsLoopbackPeer(const std::string& address) {
@@ -105,26 +101,65 @@ bool QelHostWebServer::Admit(const httplib::Request& request, httplib::Response&
     Refuse(response, 403, "the Host header must be 127.0.0.1" + port + " or localhost" + port);
     return false;
   }
+  // A page of another port of this machine is the same site to a browser, which sends the
+  // cookie with its form posts; such a page names its own origin, or "null".
+  const std::string origin = request.get_header_value("Origin");
+  if (request.has_header("Origin") && !QelHostWebRequest::IsOwnOrigin(origin, port_)) {
+    Refuse(response, 403, "the request comes from the page at '" + origin + "', not from this server's page");
+    return false;
+  }
   // Any one good token will do: cookies ignore the port, so a browser that visited an
   // earlier server on this machine still sends that server's cookie with the new address.
-  const std::string offered[] = {
-      request.get_header_value("X-Qel-Token"),
-      request.method == "GET" && request.path == "/" ? request.get_param_value("token") : std::string(),
-      CookieValue(request.get_header_value("Cookie"), kCookie)};
+  // A change of state needs the header, which only this page's script can set: a form
+  // posted from elsewhere carries the cookie but cannot add a header.
+  const bool changes = request.method != "GET" && request.method != "HEAD";
+  std::vector<std::string> offered = {request.get_header_value("X-Qel-Token")};
+  if (!changes) {
+    if (request.method == "GET" && request.path == "/") offered.push_back(request.get_param_value("token"));
+    for (std::string& value : QelHostWebRequest::CookieValues(request.get_header_value("Cookie"), kCookie))
+      offered.push_back(std::move(value));
+  }
   bool any = false;
   for (const std::string& given : offered) {
     if (given.empty()) continue;
     if (SameSecret(given, token_)) return true;
     any = true;
   }
+  if (changes && !any) {
+    Refuse(response, 403, "a change needs the access token in the X-Qel-Token header: use the page qelhost printed");
+    return false;
+  }
   Refuse(response, 403, any ? "the access token is wrong: open the address qelhost printed"
                             : "the access token is missing: open the address qelhost printed");
   return false;
 }
 
+bool QelHostWebServer::AdmitBody(const httplib::Request& request, httplib::Response& response) const {
+  if (!request.has_header("Content-Length")) return true;
+  const std::optional<size_t> length = QelHostWebRequest::ParseContentLength(request.get_header_value("Content-Length"));
+  if (!length) {
+    Refuse(response, 400, "the Content-Length header is not a number of bytes");
+    return false;
+  }
+  if (*length > QelHostWebRequest::kMaxBody) {
+    Refuse(response, 413, "the body is larger than " + std::to_string(QelHostWebRequest::kMaxBody) + " bytes");
+    return false;
+  }
+  return true;
+}
+
 void QelHostWebServer::Routes() {
   httplib::Server& http = *http_;
   http.set_payload_max_length(QelHostWebRequest::kMaxBody);
+  http.new_task_queue = [] { return new QelHostWebTaskQueue(kWarmWorkers, kMostWorkers, kWorkerLinger); };
+  // A connection serves one request and closes: a refused body is then never read, where
+  // keeping the connection would read it all to find the next request. On loopback a new
+  // connection costs less than a tenth of a millisecond.
+  http.set_keep_alive_max_count(1);
+  // A connection that says nothing is let go soon: the library polls it meanwhile.
+  http.set_keep_alive_timeout(2);
+  http.set_read_timeout(5, 0);
+  http.set_write_timeout(5, 0);
   // Headers and body go out as separate writes: without this the body waits for the
   // client's delayed acknowledgement of the headers, some 40 ms on loopback.
   http.set_tcp_nodelay(true);
@@ -133,8 +168,8 @@ void QelHostWebServer::Routes() {
                             {"Referrer-Policy", "no-referrer"},
                             {"Cache-Control", "no-store"}});
   http.set_pre_routing_handler([this](const httplib::Request& request, httplib::Response& response) {
-    return Admit(request, response) ? httplib::Server::HandlerResponse::Unhandled
-                                    : httplib::Server::HandlerResponse::Handled;
+    return Admit(request, response) && AdmitBody(request, response) ? httplib::Server::HandlerResponse::Unhandled
+                                                                    : httplib::Server::HandlerResponse::Handled;
   });
 
   auto file = [this](const char* name, const char* type) {
@@ -143,7 +178,13 @@ void QelHostWebServer::Routes() {
       std::ostringstream text;
       text << in.rdbuf();
       if (!in) return Refuse(response, 404, std::string("the page's file ") + name + " is not installed");
-      response.set_content(text.str(), type);
+      std::string content = text.str();
+      // The page's script sends the token with every change; only an admitted request sees
+      // it, and another origin's script cannot read the answer.
+      if (request.path == "/")
+        if (const size_t head = content.find("<head>"); head != std::string::npos)
+          content.insert(head + 6, "\n<meta name=\"qel-token\" content=\"" + token_ + "\">");
+      response.set_content(content, type);
       if (request.path == "/" && request.has_param("token"))
         response.set_header("Set-Cookie", std::string(kCookie) + "=" + token_ + "; Path=/; HttpOnly; SameSite=Strict");
     };
@@ -170,9 +211,24 @@ void QelHostWebServer::Routes() {
                                                 {"/api/camera", &QelHostWebApi::Camera},
                                                 {"/api/activate", &QelHostWebApi::Activate}};
   for (const auto& [path, call] : posts) {
-    http.Post(path, [this, call = call](const httplib::Request& request, httplib::Response& response) {
-      std::string body = request.body;
+    http.Post(path, [this, call = call](const httplib::Request&, httplib::Response& response,
+                                        const httplib::ContentReader& read) {
+      // A chunked body states no length: it is counted as it arrives and cut at the limit.
+      std::string body;
+      bool tooLarge = false;
+      const bool whole = read([&](const char* data, size_t length) {
+        tooLarge = body.size() + length > QelHostWebRequest::kMaxBody;
+        if (!tooLarge) body.append(data, length);
+        return !tooLarge;
+      });
+      if (tooLarge)
+        return Refuse(response, 413, "the body is larger than " + std::to_string(QelHostWebRequest::kMaxBody) + " bytes");
+      if (!whole) return Refuse(response, 400, "the body could not be read");
       Send(response, OnUiThread([this, call, body = std::move(body)] { return (api_.*call)(body); }));
+    });
+    // Without a body the library looks for a plain handler; the API then says what is missing.
+    http.Post(path, [this, call = call](const httplib::Request&, httplib::Response& response) {
+      Send(response, OnUiThread([this, call] { return (api_.*call)(std::string_view()); }));
     });
     // State changes only through POST.
     http.Get(path, [](const httplib::Request&, httplib::Response& response) {
@@ -187,11 +243,21 @@ bool QelHostWebServer::Start(int port, std::string& error) {
     error = "the port " + std::to_string(port) + " is not one from 0 to 65535";
     return false;
   }
+  // The library listens with a queue of 5: a burst of connections (a page opening, or
+  // someone flooding it) would have the rest dropped and retried a second or more later.
+  // Listening again on the bound socket lengthens the queue.
+  int listening = -1;
+  http_->set_socket_options([&listening](int socket) {
+    const int yes = 1;
+    ::setsockopt(socket, SOL_SOCKET, SO_REUSEADDR, &yes, sizeof yes);
+    listening = socket;
+  });
   port_ = port == 0 ? http_->bind_to_any_port(kLoopback) : (http_->bind_to_port(kLoopback, port) ? port : -1);
   if (port_ <= 0) {
     error = "cannot listen on " + std::string(kLoopback) + ":" + std::to_string(port) + " (in use?)";
     return false;
   }
+  if (listening >= 0) ::listen(listening, SOMAXCONN);
   listener_ = std::thread([this] {
     http_->listen_after_bind();
     listenerDone_ = true;

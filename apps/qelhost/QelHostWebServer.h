@@ -2,7 +2,8 @@
 // QelHostWebServer: serves the review page and its API on 127.0.0.1 only. The HTTP
 // library's threads check each request (peer, Host header, token), read the page's files
 // and queue every API call as a job for the UI thread, then wait for its reply: they never
-// touch a host object. Run is the UI thread's loop; it returns once the stop flag is set,
+// touch a host object. Each connection gets a worker thread, up to a cap, and serves one
+// request. Run is the UI thread's loop; it returns once the stop flag is set,
 // which a signal handler may do. Stop (or the destructor) ends the HTTP threads.
 #include <atomic>
 #include <condition_variable>
@@ -60,6 +61,8 @@ class QelHostWebServer {
   // False (the response filled with the refusal) for a request from elsewhere or
   // without the token.
   bool Admit(const httplib::Request& request, httplib::Response& response) const;
+  // False (the response filled) for a body too large to read, judged by its stated length.
+  bool AdmitBody(const httplib::Request& request, httplib::Response& response) const;
   void Routes();
 
   QelHostWebApi& api_;

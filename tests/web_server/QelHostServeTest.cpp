@@ -4,12 +4,15 @@
 #include <fcntl.h>
 #include <gtest/gtest.h>
 #include <httplib.h>
+#include <netinet/in.h>
 #include <poll.h>
 #include <signal.h>
+#include <sys/socket.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include <algorithm>
+#include <chrono>
 #include <filesystem>
 #include <fstream>
 #include <functional>
@@ -18,6 +21,7 @@
 #include <regex>
 #include <set>
 #include <sstream>
+#include <thread>
 
 namespace fs = std::filesystem;
 using json = nlohmann::json;
@@ -70,7 +74,7 @@ class QelHostServeTest : public ::testing::Test {
     fs::create_directories(resources / "web");
     for (const char* part : {"catalogs", "styles"})
       fs::create_directory_symlink(fs::path(QEL_SOURCE_DIR) / "host" / "resources" / part, resources / part);
-    std::ofstream(resources / "web" / "index.html") << "<!DOCTYPE html><title>review</title>\n";
+    std::ofstream(resources / "web" / "index.html") << "<!DOCTYPE html><head><title>review</title></head>\n";
     settings_ = folder_ / "settings";
     fs::create_directories(settings_);
 
@@ -326,3 +330,137 @@ TEST_F(QelHostServeTest, StopSavesTheSettings) {
   EXPECT_NE(text.str().find("DataFilteringPanel_LumReview"), std::string::npos) << text.str();
 }
 }  // namespace
+
+namespace {
+// A raw loopback connection to the server, for requests no HTTP client would send.
+class RawConnection {
+ public:
+  explicit RawConnection(int port) {
+    fd_ = socket(AF_INET, SOCK_STREAM, 0);
+    sockaddr_in address{};
+    address.sin_family = AF_INET;
+    address.sin_port = htons(static_cast<uint16_t>(port));
+    address.sin_addr.s_addr = htonl(INADDR_LOOPBACK);
+    if (connect(fd_, reinterpret_cast<sockaddr*>(&address), sizeof address) != 0) {
+      close(fd_);
+      fd_ = -1;
+    }
+  }
+  ~RawConnection() {
+    if (fd_ >= 0) close(fd_);
+  }
+  RawConnection(const RawConnection&) = delete;
+  bool Open() const { return fd_ >= 0; }
+  bool Send(const std::string& bytes) {
+    return fd_ >= 0 && ::send(fd_, bytes.data(), bytes.size(), MSG_NOSIGNAL) == ssize_t(bytes.size());
+  }
+  // What the server sent until it closed, or until `seconds` passed.
+  std::string Answer(int seconds) {
+    std::string answer;
+    char buffer[4096];
+    const auto end = std::chrono::steady_clock::now() + std::chrono::seconds(seconds);
+    while (std::chrono::steady_clock::now() < end) {
+      pollfd fd{fd_, POLLIN, 0};
+      if (poll(&fd, 1, 50) <= 0) continue;
+      const ssize_t n = recv(fd_, buffer, sizeof buffer, 0);
+      if (n <= 0) break;
+      answer.append(buffer, size_t(n));
+    }
+    return answer;
+  }
+
+ private:
+  int fd_ = -1;
+};
+
+long ResidentKilobytes(pid_t pid) {
+  std::ifstream status("/proc/" + std::to_string(pid) + "/status");
+  for (std::string line; std::getline(status, line);)
+    if (line.rfind("VmRSS:", 0) == 0) return std::stol(line.substr(6));
+  return -1;
+}
+}  // namespace
+
+TEST_F(QelHostServeTest, ChangesNeedTheTokenHeaderAndTheServersOwnOrigin) {
+  const std::string event = R"({"id": "0", "type": "click"})";
+  const std::string cookie = "qeltoken=" + token_;
+  const std::string own = "http://127.0.0.1:" + std::to_string(port_);
+  // A form of another page of this machine carries the cookie, never the header.
+  auto forged = client_->Post("/api/event", {{"Cookie", cookie}}, event, "text/plain");
+  ASSERT_TRUE(forged);
+  EXPECT_EQ(forged->status, 403) << forged->body;
+  EXPECT_NE(forged->body.find("X-Qel-Token"), std::string::npos) << forged->body;
+  for (const std::string& origin : std::vector<std::string>{"null", "http://127.0.0.1:1", "http://evil.example",
+                                                            own + ".evil.example"}) {
+    auto res = client_->Post("/api/event", {{"X-Qel-Token", token_}, {"Origin", origin}}, event, "application/json");
+    ASSERT_TRUE(res);
+    EXPECT_EQ(res->status, 403) << origin;
+  }
+  EXPECT_EQ(client_->Get("/api/state", {{"Cookie", cookie}, {"Origin", "null"}})->status, 403);
+  // The page itself: its own origin and the header.
+  EXPECT_EQ(client_->Post("/api/event", {{"X-Qel-Token", token_}, {"Origin", own}}, event, "application/json")->status,
+            400) << "admitted, and refused only for what it asks";
+  EXPECT_EQ(client_->Get("/api/state", {{"Cookie", cookie}, {"Origin", own}})->status, 200);
+  // Reads still take the cookie, whichever of two comes first.
+  EXPECT_EQ(client_->Get("/api/state", {{"Cookie", "qeltoken=" + std::string(32, 'f') + "; " + cookie}})->status, 200);
+  EXPECT_EQ(client_->Get("/api/state", {{"Cookie", "qeltoken=" + std::string(32, 'f') + "; qeltoken=1"}})->status, 403);
+  // A reloaded page has lost the token from its address: the page carries it.
+  auto page = client_->Get("/", {{"Cookie", cookie}});
+  ASSERT_TRUE(page && page->status == 200);
+  EXPECT_NE(page->body.find("qel-token\" content=\"" + token_), std::string::npos) << page->body;
+}
+
+TEST_F(QelHostServeTest, BodiesOverTheLimitAreRefusedBeforeTheyAreRead) {
+  const long residentBefore = ResidentKilobytes(pid_);
+  const std::string head = "POST /api/event HTTP/1.1\r\nHost: 127.0.0.1:" + std::to_string(port_) +
+                           "\r\nX-Qel-Token: " + token_ + "\r\nContent-Type: application/json\r\n";
+  {
+    // The stated length alone is enough: the answer comes with none of the body sent.
+    RawConnection stated(port_);
+    ASSERT_TRUE(stated.Send(head + "Content-Length: 201326592\r\n\r\n"));
+    const std::string answer = stated.Answer(5);
+    EXPECT_EQ(answer.rfind("HTTP/1.1 413", 0), 0u) << answer;
+  }
+  {
+    // A chunked body states no length: it is counted as it comes and cut at the limit.
+    RawConnection chunked(port_);
+    ASSERT_TRUE(chunked.Send(head + "Transfer-Encoding: chunked\r\n\r\n"));
+    const std::string chunk = "10000\r\n" + std::string(0x10000, ' ') + "\r\n";
+    int sent = 0;
+    while (sent < 1600 && chunked.Send(chunk)) ++sent;  // up to 100 MB, until the server closes
+    const std::string answer = chunked.Answer(5);
+    EXPECT_LT(sent, 1600) << "the server read on past the limit";
+    if (!answer.empty()) {
+      EXPECT_EQ(answer.rfind("HTTP/1.1 413", 0), 0u) << answer.substr(0, 200);
+    }
+  }
+  EXPECT_LT(ResidentKilobytes(pid_) - residentBefore, 16 * 1024) << "no body was kept";
+  EXPECT_EQ(State()["display"]["shown"].is_number(), true) << "the server still answers";
+}
+
+TEST_F(QelHostServeTest, IdleAndTricklingConnectionsDoNotStarveThePage) {
+  // Each of these holds a connection with half a request, as a slow or hostile client does.
+  // They connect from several threads, so that the listen queue's retries overlap.
+  std::vector<std::unique_ptr<RawConnection>> slow(200);
+  std::vector<std::thread> openers;
+  for (int t = 0; t < 10; ++t)
+    openers.emplace_back([&, t] {
+      for (int i = t; i < 200; i += 10) {
+        slow[i] = std::make_unique<RawConnection>(port_);
+        if (i % 2) slow[i]->Send("GET /api/state HTTP/1.1\r\nHo");
+      }
+    });
+  for (std::thread& opener : openers) opener.join();
+  for (const auto& connection : slow) ASSERT_TRUE(connection->Open());
+  // A fixed pool of workers all waiting on these would leave the page unanswered for the
+  // read timeout of each round of them: minutes.
+  const auto start = std::chrono::steady_clock::now();
+  httplib::Client page("127.0.0.1", port_);
+  page.set_read_timeout(20, 0);
+  auto res = page.Get("/api/state", Token());
+  const auto waited = std::chrono::steady_clock::now() - start;
+  ASSERT_TRUE(res);
+  EXPECT_EQ(res->status, 200);
+  EXPECT_LT(waited, std::chrono::seconds(4));
+  for (auto& connection : slow) connection->Send("st");  // still trickling
+}

@@ -6,7 +6,9 @@
 
 (() => {
   const $ = (id) => document.getElementById(id);
-  const token = new URLSearchParams(location.search).get('token');
+  // Changes must carry the token in a header; a reloaded page finds it where the host put it.
+  const token = new URLSearchParams(location.search).get('token') ||
+      document.querySelector('meta[name="qel-token"]')?.content || null;
   // The host answered the first visit with a cookie; the token need not stay on screen.
   if (token) history.replaceState(null, '', location.pathname);
 
