@@ -5,7 +5,7 @@
 # Runs apt-get and npm only when something is missing, so it is cheap to call every time.
 set -euo pipefail
 packages=(cmake ninja-build g++ pkg-config googletest libgtest-dev libgmock-dev libbenchmark-dev
-          nlohmann-json3-dev libpng-dev libedit-dev libfreetype-dev fonts-dejavu-core libassimp-dev
+          nlohmann-json3-dev libpng-dev libedit-dev libfreetype-dev libdeflate-dev fonts-dejavu-core libassimp-dev
           libegl-dev libegl-mesa0 libgl1-mesa-dri
           libocct-foundation-dev libocct-modeling-data-dev libocct-modeling-algorithms-dev libocct-ocaf-dev
           libocct-data-exchange-dev libcpp-httplib-dev chromium)

@@ -6,6 +6,7 @@
 #include <png.h>
 
 #include <cstdlib>
+#include <cstring>
 #include <filesystem>
 
 #include "QelPngWriter.h"
@@ -172,6 +173,27 @@ TEST(QelRasterizerTest, LabelsSharingAnAnchorMoveAsideInsteadOfCovering) {
   QelRasterizer::Render(scene, view, *image);
   EXPECT_GT(CountColor(*image, 255, 0, 0), 150);
   EXPECT_TRUE(HasColor(*image, 0, 255, 0));
+}
+
+TEST(QelPngWriterTest, PicturesReadBackExactlyWhateverTheirSizeAndContent) {
+  // Noise that deflate cannot shrink, flat colour that it can, and the smallest picture.
+  for (const auto& [width, height] : {std::pair{576, 432}, std::pair{1, 1}, std::pair{3, 700}}) {
+    auto image = QelMakeVar<QelPixelImage>(width, height);
+    uint32_t noise = 12345;
+    for (int i = 0; i < width * height * 3; ++i) {
+      noise = noise * 1103515245u + 12345u;
+      image->GetPixels()[i] = i < width * height * 3 / 2 ? uint8_t(noise >> 24) : uint8_t(200);
+    }
+    const auto file = std::filesystem::path(::testing::TempDir()) / "qel-png-round-trip.png";
+    std::string error;
+    ASSERT_TRUE(QelPngWriter::Write(*image, file.string(), error)) << error;
+    QelVar<QelPixelImage> back = ReadPng(file);
+    ASSERT_TRUE(back) << width << " x " << height << " does not decode";
+    ASSERT_EQ(back->GetWidth(), width);
+    ASSERT_EQ(back->GetHeight(), height);
+    EXPECT_EQ(std::memcmp(back->GetPixels(), image->GetPixels(), size_t(width) * height * 3), 0) << width << " x " << height;
+    std::filesystem::remove(file);
+  }
 }
 
 TEST(QelPngWriterTest, RefusesAnUnwritablePathNamingIt) {
