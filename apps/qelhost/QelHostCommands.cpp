@@ -66,7 +66,8 @@ bool Picture(QelHostSession& session, const std::vector<std::string>& args, std:
   if (!NeedArguments(args, 1, "a PNG file", error) || !NeedModel(session, error)) return false;
   QelReviewFramework::Register();
   session.Out().flush();
-  if (QelHostPictures::WritePicture(session.Root(), session.Viewer(), args[0]) != 0) {
+  // After an activation the picture is the capture's, as the page shows it.
+  if (QelHostPictures::WritePicture(session.Root(), session.Viewer(), args[0], !session.ActivatedCapture().empty()) != 0) {
     error = "picture not written (see above)";
     return false;
   }

@@ -222,6 +222,9 @@ std::string QelHostWebApi::BrowserJson() {
 }
 
 QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
+  // The labels a picture could not place are told with the answer, so the picture it names
+  // is drawn now, at the size last asked for; the page's request for it then finds it ready.
+  if (!picture_.empty() && pictureVersion_ != version_ && session_.Viewer()) DrawPicture(pictureWidth_, pictureHeight_);
   int shown = 0, hidden = 0;
   for (const auto& [set, annotations] : annotationsBySet_) {
     const QelModelObject* owner = QelModelObject::From(set.get());
@@ -264,6 +267,7 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
     }
   body += ",\"filters\":" + Dump(filters);
   body += ",\"notDrawn\":" + Dump(json{{"count", listed}, {"listed", notDrawn}});
+  body += ",\"unplaced\":" + Dump(unplaced_);
   body += ",\"products\":" + ProductsJson() + "}";
   return reply;
 }
@@ -584,6 +588,7 @@ std::string QelHostWebApi::DrawPicture(int width, int height) {
   offscreen->SetTextSprites(1);
   std::string png;
   if (offscreen->Draw() != S_OK || !QelPngWriter::Encode(*image, png)) return "the picture could not be made";
+  unplaced_ = offscreen->GetUnplacedLabels();
   picture_ = std::move(png);
   pictureVersion_ = version_;
   pictureWidth_ = width;

@@ -106,6 +106,7 @@ class QelHostWebApi {
   int servedVersion_ = 0;    // of the picture last sent
   int preparedVersion_ = 0;  // the last version PreparePicture tried
   std::string picture_;
+  std::vector<std::string> unplaced_;  // labels the last picture could not place
   std::string errorAt_;  // the widget id a refusal is about, for the page to mark
   std::vector<QelBaseUnknown_var> products_;  // in the model's order, for "products"
   std::string activatedCapture_;

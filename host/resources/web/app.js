@@ -35,6 +35,7 @@
     notDrawnMore: (rest) => `and ${rest} more`,
     products: 'Product',
     openPanel: 'Open the panel',
+    unplaced: (count, names) => `${count} label(s) not placed, marks only: ${names}`,
     noPicture: 'the picture could not be loaded',
     parts: {
       LeftEditor: 'lower value', LeftCombo: 'lower operator',
@@ -146,6 +147,9 @@
     drawProducts(state.products);
     drawBrowser(state.browser);
     drawDisplay(state.display, state.changes);
+    const unplaced = state.unplaced || [];
+    const named = unplaced.length > 6 ? words.more(unplaced.slice(0, 6).join(', '), unplaced.length - 6) : unplaced.join(', ');
+    setText($('unplaced'), unplaced.length ? words.unplaced(unplaced.length, named) : '');
     view.serial += 1;
     document.body.dataset.serial = String(view.serial);
     if (state.question) ask(state.question);

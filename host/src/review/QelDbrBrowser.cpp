@@ -59,8 +59,9 @@ HRESULT QelDbrBrowser::Open(QelBaseUnknown* object, QelFrmEditor* editor) {
                                           [this](QelBaseUnknown*, QelBaseUnknown*) { FollowUIActiveObject(); });
   }
   if (Refresh() != S_OK) return E_FAIL;
-  // Opened while a product is UI-active, the browser shows that product's sets at once.
-  if (editor) FollowUIActiveObject();
+  // Opened while another product is UI-active, the browser shows that product's sets at once.
+  QelBaseUnknown_var active = editor && editor->GetUIActivePath() ? editor->GetUIActivePath()->GetLeaf() : nullptr;
+  if (active && !active->IsEqual(object)) FollowUIActiveObject();
   return S_OK;
 }
 
