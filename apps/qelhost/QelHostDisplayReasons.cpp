@@ -222,8 +222,9 @@ std::vector<std::string> WhyNotDrawn(QelBaseUnknown* object, const std::vector<R
                           ") is on and its value " + Number(value) + " is outside");
     }
   }
-  if (reasons.empty() && !capture.empty())
-    reasons.push_back("the capture \"" + capture + "\" was activated and shows only what its view holds");
+  // The capture hid it first; the rows only read what it left.
+  if (!capture.empty())
+    reasons.insert(reasons.begin(), "the capture \"" + capture + "\" was activated and shows only what its view holds");
   if (reasons.empty()) reasons.push_back("it was hidden outside the panel; no row, switch or range hides it now");
   return reasons;
 }
