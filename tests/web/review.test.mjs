@@ -286,6 +286,15 @@ async function reviewSample(page, url) {
     if (await page.locator('#panel .section-heading').count() < 2) fail('the panel did not come back');
   });
 
+  await step('labels that find no room keep their mark and are named under the picture', async () => {
+    // A picture too small for the labels, then any change: the answer names those left out.
+    await page.evaluate(() => fetch('/api/picture.png?w=64&h=64', { cache: 'no-store' }).then((r) => r.blob()));
+    await settled(page, () => page.locator('#zoom-in').click());
+    const said = await page.locator('#unplaced').textContent();
+    if (!/^\d+ label\(s\) not placed, marks only: \S/.test(said)) fail(`under the picture: "${said}"`);
+    await settled(page, () => page.locator('#zoom-out').click());
+  });
+
   await step('Reframe brings the whole product back into the picture', async () => {
     const address = await page.locator('#picture').getAttribute('src');
     await settled(page, () => page.getByRole('button', { name: 'Reframe' }).click());
