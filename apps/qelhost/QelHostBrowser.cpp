@@ -11,9 +11,11 @@
 #include "QelDbrBrowser.h"
 #include "QelFrmEditor.h"
 #include "QelIAlias.h"
+#include "QelHostPanel.h"
 #include "QelHostSession.h"
 #include "QelIDbrBrowserContext.h"
 #include "QelIDbrBrowserViewBaseUI.h"
+#include "QelILumCapture.h"
 #include "QelIVIABaseUI.h"
 #include "QelListValQelUnicodeString.h"
 #include "QelModelScene.h"
@@ -230,6 +232,9 @@ bool QelHostActivateCommand(QelHostSession& session, const std::vector<std::stri
       session.BeginChanges();
       browser->Activate(item.get());
       session.EndChanges();
+      if (QelVar<QelILumCapture>(item.get())) session.SetActivatedCapture(args[0]);
+      // The rows follow the display the capture left, through the panel's own refresh.
+      if (QelHostPanel::PressRefresh(session.Editor())) session.Out() << "  panel refreshed\n";
       if (Qel3DViewer* viewer = session.Viewer()) {
         const QelMathPoint& eye = viewer->GetMain3DViewpoint()->GetOrigin();
         session.Out() << "  viewpoint at (" << eye.x << ", " << eye.y << ", " << eye.z << ")\n";

@@ -66,7 +66,8 @@ bool Picture(QelHostSession& session, const std::vector<std::string>& args, std:
   if (!NeedArguments(args, 1, "a PNG file", error) || !NeedModel(session, error)) return false;
   QelReviewFramework::Register();
   session.Out().flush();
-  if (QelHostPictures::WritePicture(session.Root(), session.Viewer(), args[0]) != 0) {
+  // After an activation the picture is the capture's, as the page shows it.
+  if (QelHostPictures::WritePicture(session.Root(), session.Viewer(), args[0], !session.ActivatedCapture().empty()) != 0) {
     error = "picture not written (see above)";
     return false;
   }
@@ -118,6 +119,9 @@ std::vector<QelHostCommand>& QelHostCommandTable() {
       {"picture", "FILE", "write a picture of the whole model, as shown, as PNG", &Picture},
       {"browser", "[thumbnails DIR]", "print the views browser, or write its thumbnails and an index.html into DIR", &QelHostBrowserCommand},
       {"activate", "NAME", "activate a browser item: a capture's viewpoint and display are applied", &QelHostActivateCommand},
+      {"ui-active", "PRODUCT", "make a product UI-active: the views browser shows its sets", &QelHostPanelCommands::UiActive},
+      {"why", "NAME", "say which row, switch, range, capture or set keeps an annotation from being drawn", &QelHostPanelCommands::Why},
+      {"reset", "", "click the panel back to how it read when the model opened", &QelHostPanelCommands::Reset},
       {"help", "", "list the commands", &Help},
       {"quit", "", "end the session", &Quit},
   };

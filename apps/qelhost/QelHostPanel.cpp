@@ -1,13 +1,19 @@
 #include "QelHostPanel.h"
 
 #include <algorithm>
+#include <cmath>
+#include <cstdio>
+#include <cstdlib>
 #include <ostream>
 
 #include "QelApplicationFrame.h"
 #include "QelVidCtl.h"
+#include "QelVidCtlButton.h"
 #include "QelVidCtlCheckButton.h"
 #include "QelVidCtlExpander.h"
 #include "QelVidCtlFrame.h"
+#include "QelVidCtlImageAndLabelCombo.h"
+#include "QelVidCtlLineEditor.h"
 #include "QelVidLayGrid.h"
 
 namespace {
@@ -158,3 +164,99 @@ std::string QelHostPanel::Closest(const std::vector<Row>& rows, const std::strin
 }
 
 void QelHostPanel::Print(std::ostream& out, const std::vector<Row>& rows) { PrintRows(out, rows, "", 0); }
+
+bool QelHostPanel::PressRefresh(QelFrmEditor* editor) {
+  QelDbrFraPanel* panel = Find(editor);
+  QelVidWidget* dialog = panel ? panel->GetApplicativeWidget() : nullptr;
+  auto* button = dialog ? dynamic_cast<QelVidCtlButton*>(dialog->FindDescendant("RefreshButton")) : nullptr;
+  if (!button || !button->IsEnabled()) return false;
+  // The click puts a new dialog into the panel; the old one goes when the host is idle.
+  QelVar<QelDbrFraPanel> hold = QelVar<QelDbrFraPanel>::Retain(panel);
+  return button->Click();
+}
+
+namespace {
+std::string SelectedText(const QelHostPanelRow& row, const char* part) {
+  auto* combo = dynamic_cast<QelVidCtlImageAndLabelCombo*>(Descendant(row.row.get(), part));
+  if (!combo || combo->GetSelectedIndex() < 0 || combo->GetSelectedIndex() >= combo->GetLineCount()) return {};
+  return combo->GetLine(combo->GetSelectedIndex()).Utf8();
+}
+
+std::string EditorText(const QelHostPanelRow& row, const char* part) {
+  auto* editor = dynamic_cast<QelVidCtlLineEditor*>(Descendant(row.row.get(), part));
+  return editor ? editor->GetText().Utf8() : std::string();
+}
+
+std::string Number(double value) {
+  char text[32];
+  std::snprintf(text, sizeof text, "%g", value);
+  return text;
+}
+}  // namespace
+
+std::string QelHostPanel::RangeInEffect(const QelHostPanelRow& row) {
+  if (row.kind != Row::Kind::Range) return {};
+  if (row.state != 1) return "off";
+  const std::string lower = SelectedText(row, "LeftCombo");
+  if (lower == "=") return "t = " + EditorText(row, "LeftEditor");
+  return EditorText(row, "LeftEditor") + " " + lower + " t " + SelectedText(row, "RightCombo") + " " +
+         EditorText(row, "RightEditor");
+}
+
+std::string QelHostPanel::RangeProblem(const QelHostPanelRow& row, const std::string& lower, double lowerValue,
+                                       bool hasUpper, double upperValue, bool byTick) {
+  if (!std::isfinite(lowerValue) || (hasUpper && !std::isfinite(upperValue)))
+    return "a bound must be a finite number";
+  if (lower == "=") return lowerValue > 0.0 || !byTick ? std::string() : "the value must be above 0";
+  const double upper = hasUpper ? upperValue : std::strtod(EditorText(row, "RightEditor").c_str(), nullptr);
+  // The row's tick takes a range only with bounds above 0, and the filter only a range
+  // whose upper bound is not below its lower one.
+  if (byTick && lowerValue <= 0.0) return "the lower bound must be above 0";
+  if (upper < lowerValue)
+    return "the upper bound " + Number(upper) + " is below the lower bound " + Number(lowerValue);
+  return {};
+}
+
+namespace {
+void CollectMarks(const std::vector<Row>& rows, const std::string& parent, std::vector<QelHostPanelMark>& marks) {
+  for (const Row& row : rows) {
+    const std::string path = parent.empty() ? row.label : parent + "/" + row.label;
+    if (row.check) marks.push_back({path, row.kind == Row::Kind::Radio, row.state});
+    CollectMarks(row.children, path, marks);
+  }
+}
+}  // namespace
+
+std::vector<QelHostPanelMark> QelHostPanel::Marks(const std::vector<Row>& rows) {
+  std::vector<QelHostPanelMark> marks;
+  CollectMarks(rows, "", marks);
+  return marks;
+}
+
+int QelHostPanel::RestoreMarks(QelFrmEditor* editor, const std::vector<QelHostPanelMark>& marks) {
+  if (!Find(editor)) return -1;
+  int clicks = 0;
+  // Each click rebuilds the rows, so the walk starts again after it; a click that changes
+  // nothing (a refused question) is not tried twice.
+  std::vector<bool> tried(marks.size(), false);
+  for (bool clicked = true; clicked;) {
+    clicked = false;
+    QelDbrFraPanel* panel = Find(editor);
+    if (!panel) break;
+    const std::vector<Row> rows = ReadRows(panel);
+    for (int pass = 0; pass < 2 && !clicked; ++pass)
+      for (size_t i = 0; i < marks.size() && !clicked; ++i) {
+        const QelHostPanelMark& mark = marks[i];
+        if (tried[i] || mark.radio != (pass == 0) || mark.state == 2 || (mark.radio && mark.state != 1)) continue;
+        const Row* row = Resolve(rows, mark.path);
+        auto* check = row ? dynamic_cast<QelVidCtlCheckButton*>(row->check.get()) : nullptr;
+        if (!check || row->state == mark.state) continue;
+        tried[i] = true;
+        QelVar<QelDbrFraPanel> hold = QelVar<QelDbrFraPanel>::Retain(panel);
+        check->Click();
+        ++clicks;
+        clicked = true;
+      }
+  }
+  return clicks;
+}

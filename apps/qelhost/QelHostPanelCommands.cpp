@@ -8,6 +8,7 @@
 #include "Qel3DWindow.h"
 #include "QelApplicationFrame.h"
 #include "QelDftWindow.h"
+#include "QelHostDisplayReasons.h"
 #include "QelHostPanel.h"
 #include "QelHostSession.h"
 #include "QelModelPrinter.h"
@@ -204,6 +205,18 @@ bool Range(QelHostSession& session, const Args& args, std::string& error) {
     error = "the range row has no editors";
     return false;
   }
+  // Refused before anything is typed, so the row keeps showing the range that filters.
+  auto* check = dynamic_cast<QelVidCtlCheckButton*>(row->check.get());
+  const bool ticking = check && row->state != 1;
+  const double upper = args.size() == 5 ? std::strtod(args[4].c_str(), nullptr) : 0.0;
+  if (std::string why =
+          QelHostPanel::RangeProblem(*row, args[1], std::strtod(args[2].c_str(), nullptr), args.size() == 5, upper,
+                                     ticking);
+      !why.empty()) {
+    const std::string now = QelHostPanel::RangeInEffect(*row);
+    error = why + (now == "off" ? "; the row filters nothing, it is not ticked" : "; the row still filters by " + now);
+    return false;
+  }
   leftCombo->Select(left);
   leftEditor->Enter(QelUnicodeString(args[2].c_str()));
   if (args.size() == 5) {
@@ -211,8 +224,6 @@ bool Range(QelHostSession& session, const Args& args, std::string& error) {
     rightEditor->Enter(QelUnicodeString(args[4].c_str()));
   }
   // An unticked range row takes its range with the tick; a ticked one with its button.
-  auto* check = dynamic_cast<QelVidCtlCheckButton*>(row->check.get());
-  const bool ticking = check && row->state != 1;
   if (!ticking && !apply->IsEnabled()) {
     error = "the range is not valid (the apply button stays disabled)";
     return false;
@@ -272,7 +283,9 @@ bool Panel(QelHostSession& session, const Args& args, std::string& error) {
     return true;
   }
   out << "[" << panel->GetTitle().Utf8() << "]" << (panel->GetVisibleFlag() ? "" : " (minimized)") << '\n';
-  if (panel->GetVisibleFlag()) out << QelVidPrintText(panel->GetApplicativeWidget());
+  if (!panel->GetVisibleFlag()) return true;
+  out << QelVidPrintText(panel->GetApplicativeWidget());
+  out << "filters: " << QelHostDisplayReasons::SummaryLine(QelHostDisplayReasons::Summary(panel)) << '\n';
   return true;
 }
 
@@ -417,6 +430,63 @@ bool LightLoad(QelHostSession& session, const Args& args, std::string& error) {
   }
   product->SetLightLoadMode(args[1] == "on");
   session.Out() << "light-load mode of " << args[0] << " " << args[1] << '\n';
+  return true;
+}
+
+bool UiActive(QelHostSession& session, const Args& args, std::string& error) {
+  if (!Expect(args, 1, 1, "the name of a product", error)) return false;
+  if (!session.Editor() || !session.Root()) {
+    error = "no open editor";
+    return false;
+  }
+  QelListValQelBaseUnknown_var found = QelModelPrinter::FindByAlias(session.Root(), args[0]);
+  auto* product = found.Size() ? QelSysDynamicCast<QelPLMProductOccurrence>(found[1].get()) : nullptr;
+  if (!product) {
+    error = "the model has no product \"" + args[0] + "\"";
+    return false;
+  }
+  // The path runs from the root down to the product, as a click in the product tree makes it.
+  std::vector<QelBaseUnknown_var> chain;
+  for (QelBaseUnknown_var at = QelBaseUnknown_var::Retain(product); at && chain.size() < 64;) {
+    chain.push_back(at);
+    auto* occurrence = QelSysDynamicCast<QelPLMProductOccurrence>(at.get());
+    QelBaseUnknown_var father;
+    if (!occurrence || occurrence->GetFather(father) != S_OK) break;
+    at = father;
+  }
+  auto path = QelMakeVar<QelPathElement>();
+  for (auto it = chain.rbegin(); it != chain.rend(); ++it) path->AddChildElement(it->get());
+  session.Editor()->SetUIActivePath(path.get());
+  session.Out() << "UI-active: " << args[0] << '\n';
+  return true;
+}
+
+bool Why(QelHostSession& session, const Args& args, std::string& error) {
+  if (!Expect(args, 1, 1, "the name of an annotation or a set", error)) return false;
+  if (!session.Root()) {
+    error = "no model is open";
+    return false;
+  }
+  std::vector<std::string> reasons;
+  if (!QelHostDisplayReasons::Why(session.Root(), QelHostPanel::Find(session.Editor()), args[0],
+                                  session.ActivatedCapture(), reasons, error))
+    return false;
+  session.Out() << "why " << args[0] << ":\n";
+  for (const std::string& reason : reasons) session.Out() << "  " << reason << '\n';
+  return true;
+}
+
+bool Reset(QelHostSession& session, const Args& args, std::string& error) {
+  if (!Expect(args, 0, 0, "no argument", error)) return false;
+  if (session.OpeningMarks().empty() || !NeedPanel(session, error)) {
+    if (error.empty()) error = "the panel was not shown when the model opened; nothing to go back to";
+    return false;
+  }
+  session.BeginChanges();
+  const int clicks = QelHostPanel::RestoreMarks(session.Editor(), session.OpeningMarks());
+  session.Out() << "reset: " << clicks << " click(s)\n";
+  session.EndChanges();
+  session.SetActivatedCapture({});
   return true;
 }
 }  // namespace QelHostPanelCommands

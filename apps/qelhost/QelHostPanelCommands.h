@@ -27,4 +27,7 @@ bool Setting(QelHostSession&, const Args&, std::string&);
 bool CloseEditor(QelHostSession&, const Args&, std::string&);
 bool Select(QelHostSession&, const Args&, std::string&);
 bool LightLoad(QelHostSession&, const Args&, std::string&);
+bool UiActive(QelHostSession&, const Args&, std::string&);
+bool Why(QelHostSession&, const Args&, std::string&);
+bool Reset(QelHostSession&, const Args&, std::string&);
 }  // namespace QelHostPanelCommands

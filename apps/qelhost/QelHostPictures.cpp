@@ -45,23 +45,6 @@ struct Request {
   std::string output;
 };
 
-// The path of the product that owns the item's set, from the root: the context the item's
-// geometry is placed in.
-QelVar<QelPathElement> ContextPath(QelBaseUnknown* root, QelBaseUnknown* item) {
-  auto rootPath = QelMakeVar<QelPathElement>();
-  rootPath->AddChildElement(root);
-  QelBaseUnknown_var set;
-  if (QelVar<QelITPSView> view{item}) view->GetSet(set);
-  if (QelVar<QelILumCapture> capture{item}) capture->GetSet(set);
-  QelBaseUnknown_var made, owner;
-  QelLumInstantiateComponentBase(62, made);
-  QelVar<QelILumSetComponent> sets{made.get()};
-  if (!set || !sets || sets->GetSetOwner(set.get(), owner) != S_OK || !owner) return rootPath;
-  QelVar<QelIBuildPath> builder{owner.get()};
-  QelVar<QelPathElement> path = builder ? builder->BuildPath(rootPath.get()) : QelVar<QelPathElement>();
-  return path ? path : rootPath;
-}
-
 std::string FileNameFor(const std::string& alias) {
   std::string name;
   for (char c : alias) name += (std::isalnum(static_cast<unsigned char>(c)) || c == '-' || c == '.') ? c : '_';
@@ -71,7 +54,10 @@ std::string FileNameFor(const std::string& alias) {
 bool WriteThumbnail(QelBaseUnknown* root, QelBaseUnknown* item, Qel3DViewer* viewer, const std::string& file,
                     PreviewFn preview, DescriptionFn describe) {
   QelBaseUnknown_var handle = QelBaseUnknown_var::Retain(item);
-  QelVar<QelPathElement> context = ContextPath(root, item);
+  // The root path, as the views browser gives its items: the toolbox builds the item's own
+  // path under it, so both draw the same picture.
+  auto context = QelMakeVar<QelPathElement>();
+  context->AddChildElement(root);
   QelVar<QelPixelImage> image = QelVar<QelPixelImage>::Adopt(preview(handle, viewer, context.get()));
   if (!image) {
     std::fprintf(stderr, "qelhost: no thumbnail could be made for '%s'\n", QelModelObject::From(item)->Alias().c_str());
@@ -127,14 +113,16 @@ int Produce(const std::vector<Request>& thumbnails, const std::vector<std::strin
 }
 }  // namespace
 
-int QelHostPictures::WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file) {
-
+int QelHostPictures::WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file,
+                                  bool keepViewpoint) {
   Qel3DViewpoint* viewpoint = viewer->GetMain3DViewpoint();
-  viewpoint->SetOrientation(QelMathDirectionf(QelMathVector{-1, 1.5, -1}), QelMathDirectionf(QelMathVector{0, 0, 1}));
-  auto path = QelMakeVar<QelPathElement>();
-  path->AddChildElement(root);
   viewer->PrepareViewpoint();
-  QelRovActivateAndDisplayToolbox::ReframeViewpointOnDisplayArea(path.get(), viewer, viewpoint);
+  if (!keepViewpoint) {
+    viewpoint->SetOrientation(QelMathDirectionf(QelMathVector{-1, 1.5, -1}), QelMathDirectionf(QelMathVector{0, 0, 1}));
+    auto path = QelMakeVar<QelPathElement>();
+    path->AddChildElement(root);
+    QelRovActivateAndDisplayToolbox::ReframeViewpointOnDisplayArea(path.get(), viewer, viewpoint);
+  }
   QelSupport* support = viewer->GetSupport();
   auto image = QelMakeVar<QelPixelImage>(support->GetWidth(), support->GetHeight());
   QelVar<QelOffscreenSupport> offscreen = createSupport(support, image.get());
@@ -151,6 +139,13 @@ int QelHostPictures::WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, con
     return 1;
   }
   std::printf("picture -> %s (%d x %d)\n", file.c_str(), image->GetWidth(), image->GetHeight());
+  // A shown annotation whose label found no room keeps its mark; the person is told which.
+  const std::vector<std::string>& unplaced = offscreen->GetUnplacedLabels();
+  if (!unplaced.empty()) {
+    std::string names;
+    for (const std::string& name : unplaced) names += (names.empty() ? "" : ", ") + name;
+    std::printf("  %zu label(s) not placed, marks only: %s\n", unplaced.size(), names.c_str());
+  }
   return 0;
 }
 

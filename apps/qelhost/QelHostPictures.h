@@ -13,7 +13,9 @@ namespace QelHostPictures {
 // loaded plug-in (its toolbox makes the thumbnails). Each prints what it wrote, or why
 // not on stderr, and answers the number of pictures that could not be written.
 int WriteThumbnails(void* module, QelBaseUnknown* root, const std::string& name, const std::string& output);
-int WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file);
+// `keepViewpoint`: draw from the viewer's viewpoint as it is (a capture's, after an
+// activation) instead of the whole model from above and aside.
+int WritePicture(QelBaseUnknown* root, Qel3DViewer* viewer, const std::string& file, bool keepViewpoint = false);
 
 // Looks up a function the plug-in exports by its (mangled) name; false, with the loader's
 // reason on stderr, when the module has no such export.

@@ -6,7 +6,12 @@
 
 #include <editline/readline.h>
 
+#include <signal.h>
+
+#include <csignal>
+#include <cstdio>
 #include <cstdlib>
+#include <filesystem>
 
 #include "QelApplicationFrame.h"
 #include "QelDelayedDestruction.h"
@@ -14,7 +19,7 @@
 #include "QelSettingRepository.h"
 #include "QelDlgNotify.h"
 #include "QelHostCommands.h"
-#include "QelIAlias.h"
+#include "QelHostDisplayReasons.h"
 #include "QelHostModelFiles.h"
 #include "QelModelLoader.h"
 #include "QelRovFacetServices.h"
@@ -23,20 +28,55 @@
 namespace {
 bool IsShown(QelBaseUnknown* object) { return QelRovFacetServices::IsDisplayEnabled(object) == S_OK; }
 
-std::string NameOf(QelBaseUnknown* object) {
-  QelUnicodeString alias;
-  if (QelVar<QelIAlias> named{object}) named->GetAlias(alias);
-  return alias.IsEmpty() ? std::string("(no name)") : alias.Utf8();
-}
+using QelHostDisplayReasons::NameOf;
 
-// One line from the terminal with editing and history; false at end of input.
-bool ReadLine(const char* prompt, std::string& line) {
+volatile std::sig_atomic_t interrupted = 0;
+
+void OnInterrupt(int) { interrupted = 1; }
+
+// What a read from the terminal gave.
+enum class Read { Line, Interrupted, End };
+
+// One line from the terminal with editing and history. Ctrl-C abandons the line being
+// typed (Interrupted); Ctrl-D on an empty line ends the input (End).
+Read ReadLine(const char* prompt, std::string& line) {
+  interrupted = 0;
   char* read = readline(prompt);
-  if (!read) return false;
+  if (interrupted) {
+    std::free(read);
+    std::fputs("\n", stdout);
+    return Read::Interrupted;
+  }
+  if (!read) {
+    // The terminal's cursor is left after the prompt: end the line for the shell.
+    std::fputs("\n", stdout);
+    return Read::End;
+  }
   line = read;
   std::free(read);
-  return true;
+  return Read::Line;
 }
+
+// Ctrl-C reaches the session as an interruption of the read, not as the end of qelhost.
+// Installed while the session reads the terminal.
+class InterruptScope {
+ public:
+  InterruptScope() {
+    struct sigaction action {};
+    action.sa_handler = &OnInterrupt;
+    sigemptyset(&action.sa_mask);
+    action.sa_flags = 0;  // no restart: the read returns
+    sigaction(SIGINT, &action, &previous_);
+  }
+  ~InterruptScope() { sigaction(SIGINT, &previous_, nullptr); }
+  InterruptScope(const InterruptScope&) = delete;
+  InterruptScope& operator=(const InterruptScope&) = delete;
+
+ private:
+  struct sigaction previous_ {};
+};
+
+std::string HistoryFile() { return QelSettingRepository::SettingsFolder() + "/qelhost_history"; }
 }  // namespace
 
 QelHostSession::QelHostSession(std::ostream& out, std::ostream& err) : out_(out), err_(err) {
@@ -105,6 +145,8 @@ bool QelHostSession::Attach(const QelBaseUnknown_var& root, const std::string& n
   SwitchPanelOnByDefault();
   controller_->CreateDataFilteringPanelIfNecessary();
   QelDelayedDestruction::FlushIdle();
+  activatedCapture_.clear();
+  openingMarks_ = QelHostPanel::Marks(QelHostPanel::ReadRows(QelHostPanel::Find(editor_.get())));
   return true;
 }
 
@@ -174,18 +216,33 @@ int QelHostSession::RunInteractive() {
   QelDlgNotify::SetAsker([this](const QelDlgNotify&, const QelUnicodeString& message, const QelUnicodeString& title) {
     out_ << title.Utf8() << '\n' << message.Utf8() << '\n';
     out_.flush();
-    for (std::string answer; ReadLine("yes/no? ", answer);) {
+    for (std::string answer;;) {
+      const Read read = ReadLine("yes/no? ", answer);
+      // Ctrl-C at the question is a no; only the end of input leaves it unanswered.
+      if (read == Read::Interrupted) return QelDlgNotify::AnswerNo;
+      if (read == Read::End) return QelDlgNotify::AnswerNone;
       if (answer == "yes" || answer == "y") return QelDlgNotify::AnswerYes;
       if (answer == "no" || answer == "n") return QelDlgNotify::AnswerNo;
     }
-    return QelDlgNotify::AnswerNone;
   });
-  out_ << "qelhost review session; help lists the commands\n";
+  const InterruptScope interrupts;
+  // The lines of earlier sessions come back with the arrow keys.
+  const std::string history = HistoryFile();
+  std::error_code ignored;
+  std::filesystem::create_directories(QelSettingRepository::SettingsFolder(), ignored);
+  stifle_history(1000);
+  read_history(history.c_str());
+  out_ << "qelhost review session; help lists the commands, quit or Ctrl-D ends it\n";
   std::string line;
   for (int number = 1; !quit_; ++number) {
     out_.flush();
-    if (!ReadLine("qelhost> ", line)) break;
-    if (!line.empty()) add_history(line.c_str());
+    const Read read = ReadLine("qelhost> ", line);
+    if (read == Read::End) break;
+    if (read == Read::Interrupted) continue;
+    if (!line.empty()) {
+      add_history(line.c_str());
+      write_history(history.c_str());
+    }
     std::string error;
     if (!Execute(line, error)) out_ << "line " << number << ": " << error << '\n';
   }

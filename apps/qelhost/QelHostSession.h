@@ -14,6 +14,7 @@
 #include "Qel3DWindow.h"
 #include "QelCallbackManager.h"
 #include "QelFrmEditor.h"
+#include "QelHostPanel.h"
 #include "QelIHyxFacetCtrl.h"
 
 // The workbench a session starts in: one of those that have the panel.
@@ -62,6 +63,13 @@ class QelHostSession {
   void BeginChanges();
   void EndChanges();
 
+  // The panel's boxes and radios as they read once the model was open: what `reset`
+  // brings back.
+  const std::vector<QelHostPanelMark>& OpeningMarks() const { return openingMarks_; }
+  // The capture activated last, which hid what its view does not hold; empty after reset.
+  const std::string& ActivatedCapture() const { return activatedCapture_; }
+  void SetActivatedCapture(std::string name) { activatedCapture_ = std::move(name); }
+
  private:
   void SwitchPanelOnByDefault();
 
@@ -78,4 +86,6 @@ class QelHostSession {
   std::map<QelBaseUnknown*, bool> shownBefore_;       // state before the first change
   bool quit_ = false;
   void* module_ = nullptr;
+  std::vector<QelHostPanelMark> openingMarks_;
+  std::string activatedCapture_;
 };

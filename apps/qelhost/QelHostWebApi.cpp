@@ -8,6 +8,7 @@
 #include "QelDbrBrowser.h"
 #include "QelDelayedDestruction.h"
 #include "QelFrmEditor.h"
+#include "QelHostDisplayReasons.h"
 #include "QelHostPanel.h"
 #include "QelHostSession.h"
 #include "QelIAlias.h"
@@ -18,9 +19,15 @@
 #include "QelIVIABaseUI.h"
 #include "QelListValQelUnicodeString.h"
 #include "QelModelObject.h"
+#include "QelModelPrinter.h"
+#include "QelPLMProductOccurrence.h"
+#include "QelVidLayGrid.h"
 #include "QelModelScene.h"
 #include "QelOffscreenSupport.h"
 #include "QelPngWriter.h"
+#include "QelSettingRepository.h"
+#include "QelFrmContext.h"
+#include "QelIHyxFacetCtrl.h"
 #include "QelReviewFramework.h"
 #include "QelRovActivateAndDisplayToolbox.h"
 #include "QelRovFacetServices.h"
@@ -40,17 +47,35 @@ constexpr double kPi = 3.14159265358979323846;
 // Names come from model files; a stray byte must not make the whole answer fail.
 std::string Dump(const json& value) { return value.dump(-1, ' ', false, json::error_handler_t::replace); }
 
-QelHostWebReply Error(int status, const std::string& message) {
-  return {status, kQelJsonType, Dump(json{{"error", message}})};
+QelHostWebReply Error(int status, const std::string& message, const std::string& at = {}) {
+  json body{{"error", message}};
+  // The widget a refusal is about, so the page can say it beside that box.
+  if (!at.empty()) body["at"] = at;
+  return {status, kQelJsonType, Dump(body)};
+}
+
+// The id QelVidAppendJson gives `w` under `root`: its path of child indices.
+std::string IdOf(QelVidWidget* root, QelVidWidget* w) {
+  std::vector<size_t> path;
+  for (; w && w != root; w = w->GetParent()) {
+    QelVidWidget* parent = w->GetParent();
+    if (!parent) return {};
+    std::vector<QelVidWidget*> children;
+    if (auto* grid = dynamic_cast<QelVidLayGrid*>(parent)) children = grid->GetWidgetsInOrder();
+    else for (int i = 0; i < parent->GetChildCount(); ++i) children.push_back(parent->GetChild(i));
+    const auto at = std::find(children.begin(), children.end(), w);
+    if (at == children.end()) return {};
+    path.push_back(static_cast<size_t>(at - children.begin()));
+  }
+  if (!w) return {};
+  std::string id = "0";
+  for (auto it = path.rbegin(); it != path.rend(); ++it) id += "." + std::to_string(*it);
+  return id;
 }
 
 bool IsShown(QelBaseUnknown* object) { return QelRovFacetServices::IsDisplayEnabled(object) == S_OK; }
 
-std::string NameOf(QelBaseUnknown* object) {
-  QelUnicodeString alias;
-  if (QelVar<QelIAlias> named{object}) named->GetAlias(alias);
-  return alias.IsEmpty() ? std::string("(no name)") : alias.Utf8();
-}
+using QelHostDisplayReasons::NameOf;
 
 QelVar<QelPathElement> RootPath(QelBaseUnknown* root) {
   auto path = QelMakeVar<QelPathElement>();
@@ -97,6 +122,19 @@ QelHostWebApi::QelHostWebApi(QelHostSession& session) : session_(session) {
     for (uint32_t i = 0; i < count; ++i)
       if (QelBaseUnknown_var item; elements->GetItem(i, item) == S_OK && item) annotations.push_back(item);
     annotationsBySet_.emplace_back(set, std::move(annotations));
+  }
+
+  // The product tree, root first, each product before its children.
+  std::vector<QelBaseUnknown_var> pending{QelBaseUnknown_var::Retain(root)};
+  while (!pending.empty() && products_.size() < 10000) {
+    QelBaseUnknown_var product = pending.back();
+    pending.pop_back();
+    auto* occurrence = QelSysDynamicCast<QelPLMProductOccurrence>(product.get());
+    if (!occurrence) continue;
+    products_.push_back(product);
+    QelListValQelBaseUnknown_var children;
+    occurrence->ListChildren(children);
+    for (int i = children.Size(); i >= 1; --i) pending.push_back(children[i]);
   }
 
   displayCallback_ = QelRovFacetServices::AddDisplayChangeCallback(
@@ -184,6 +222,9 @@ std::string QelHostWebApi::BrowserJson() {
 }
 
 QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
+  // The labels a picture could not place are told with the answer, so the picture it names
+  // is drawn now, at the size last asked for; the page's request for it then finds it ready.
+  if (!picture_.empty() && pictureVersion_ != version_ && session_.Viewer()) DrawPicture(pictureWidth_, pictureHeight_);
   int shown = 0, hidden = 0;
   for (const auto& [set, annotations] : annotationsBySet_) {
     const QelModelObject* owner = QelModelObject::From(set.get());
@@ -203,13 +244,148 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
   body += ",\"changes\":" + Dump(json{{"shown", changes.shown}, {"hidden", changes.hidden}});
   body += ",\"display\":" + Dump(json{{"shown", shown}, {"hidden", hidden}});
   body += ",\"picture\":\"/api/picture.png?v=" + std::to_string(version_) + "\"";
-  body += ",\"question\":" + Dump(question) + "}";
+  body += ",\"question\":" + Dump(question);
+  // What filters now, each part with the box that undoes it, and why each hidden annotation
+  // is not drawn: read off the rows once for the whole answer.
+  const std::vector<QelHostPanelRow> rows = panel ? QelHostPanel::ReadRows(panel) : std::vector<QelHostPanelRow>();
+  json filters = json::array();
+  for (const auto& part : QelHostDisplayReasons::Summary(rows)) {
+    const QelHostPanelRow* row = part.undo.empty() ? nullptr : QelHostPanel::Resolve(rows, part.undo);
+    const std::string id = row && row->check ? IdOf(panel, row->check.get()) : std::string();
+    filters.push_back({{"text", part.text}, {"undo", id.empty() ? json(nullptr) : json(id)}});
+  }
+  json notDrawn = json::array();
+  size_t listed = 0;
+  constexpr size_t kHiddenListed = 200;
+  for (const auto& [set, annotations] : annotationsBySet_)
+    for (const auto& annotation : annotations) {
+      if (IsShown(annotation.get()) && IsShown(set.get())) continue;
+      if (++listed > kHiddenListed) continue;
+      notDrawn.push_back({{"name", NameOf(annotation.get())},
+                          {"row", QelHostDisplayReasons::RowName(annotation.get())},
+                          {"why", QelHostDisplayReasons::WhyNotDrawn(annotation.get(), rows, activatedCapture_)}});
+    }
+  body += ",\"filters\":" + Dump(filters);
+  body += ",\"notDrawn\":" + Dump(json{{"count", listed}, {"listed", notDrawn}});
+  body += ",\"unplaced\":" + Dump(unplaced_);
+  body += ",\"products\":" + ProductsJson() + "}";
   return reply;
 }
 
 QelHostWebReply QelHostWebApi::State() { return StateWith({}); }
 
+std::string QelHostWebApi::ProductsJson() {
+  QelBaseUnknown_var active;
+  if (QelFrmEditor* editor = session_.Editor()) active = editor->GetUIActivePath()->GetLeaf();
+  json products = json::array();
+  for (size_t i = 0; i < products_.size(); ++i) {
+    int depth = 0;
+    QelBaseUnknown_var father;
+    for (auto* at = QelSysDynamicCast<QelPLMProductOccurrence>(products_[i].get());
+         at && at->GetFather(father) == S_OK && depth < 64; at = QelSysDynamicCast<QelPLMProductOccurrence>(father.get()))
+      ++depth;
+    products.push_back({{"product", i + 1},
+                        {"name", NameOf(products_[i].get())},
+                        {"depth", depth},
+                        {"active", active && active->IsEqual(products_[i].get())}});
+  }
+  return Dump(products);
+}
+
+QelHostWebReply QelHostWebApi::Reset(std::string_view) {
+  pending_.reset();
+  question_.reset();
+  if (session_.OpeningMarks().empty()) return Error(400, "the panel was not shown when the model opened");
+  BeginChanges();
+  QelHostPanel::RestoreMarks(session_.Editor(), session_.OpeningMarks());
+  Changes changes = EndChanges();
+  QelDelayedDestruction::FlushIdle();
+  activatedCapture_.clear();
+  return StateWith(changes);
+}
+
+QelHostWebReply QelHostWebApi::UiActive(std::string_view body) {
+  pending_.reset();
+  question_.reset();
+  const json request = json::parse(body, nullptr, false);
+  if (!request.is_object() || !request.contains("product") || !request["product"].is_number_integer())
+    return Error(400, "expects {\"product\": N}, N from the state's products");
+  const auto number = request["product"].get<int64_t>();
+  if (number < 1 || number > static_cast<int64_t>(products_.size()))
+    return Error(400, "no product " + std::to_string(number));
+  std::vector<QelBaseUnknown_var> chain;
+  for (QelBaseUnknown_var at = products_[static_cast<size_t>(number - 1)]; at && chain.size() < 64;) {
+    chain.push_back(at);
+    auto* occurrence = QelSysDynamicCast<QelPLMProductOccurrence>(at.get());
+    QelBaseUnknown_var father;
+    if (!occurrence || occurrence->GetFather(father) != S_OK) break;
+    at = father;
+  }
+  auto path = QelMakeVar<QelPathElement>();
+  for (auto it = chain.rbegin(); it != chain.rend(); ++it) path->AddChildElement(it->get());
+  // The browser follows through its context; the items it lists now get new ids.
+  session_.Editor()->SetUIActivePath(path.get());
+  QelDelayedDestruction::FlushIdle();
+  return State();
+}
+
+QelHostWebReply QelHostWebApi::OpenPanel(std::string_view) {
+  pending_.reset();
+  question_.reset();
+  QelFrmContext* context = QelFrmContext::GetContext();
+  QelSettingRepository* repository = QelSettingRepository::GetRepository("QelRovDataFiltering");
+  QelIHyxFacetCtrl* controller = session_.Controller();
+  if (!context || !repository || !controller) return Error(400, "no panel can be shown here");
+  const std::string key = std::string("DataFilteringPanel_") + context->GetWorkbenchName().CastToCharPtr();
+  if (repository->WriteSetting(key.c_str(), 1) != S_OK || repository->SaveRepository() != S_OK)
+    return Error(500, "could not save " + key + " in " + repository->GetFilePath());
+  controller->CreateDataFilteringPanelIfNecessary();
+  QelDelayedDestruction::FlushIdle();
+  if (!QelHostPanel::Find(session_.Editor())) return Error(400, "the workbench or the window takes no panel");
+  return State();
+}
+
+std::string QelHostWebApi::RangeRefusal(QelVidWidget* root, QelVidWidget* widget, const QelHostWebEvent& event) {
+  using Type = QelHostWebEvent::Type;
+  if (event.type != Type::Text && event.type != Type::Click) return {};
+  // The range row holding the widget: the nearest ancestor with its editors and button.
+  QelVidWidget* rowWidget = widget;
+  while (rowWidget && !(rowWidget->FindDescendant("LeftEditor") && rowWidget->FindDescendant("RangeButton")))
+    rowWidget = rowWidget->GetParent();
+  if (!rowWidget || rowWidget == root) return {};
+  auto* left = As<QelVidCtlLineEditor>(rowWidget->FindDescendant("LeftEditor"));
+  auto* right = As<QelVidCtlLineEditor>(rowWidget->FindDescendant("RightEditor"));
+  auto* combo = As<QelVidCtlImageAndLabelCombo>(rowWidget->FindDescendant("LeftCombo"));
+  auto* check = As<QelVidCtlCheckButton>(rowWidget->FindDescendant("CheckBox"));
+  if (!left || !right || !combo) return {};
+  if (event.type == Type::Text) {
+    if (widget != left && widget != right) return {};
+    char* end = nullptr;
+    const double value = std::strtod(event.text.c_str(), &end);
+    if (!event.text.empty() && *end == '\0' && std::isfinite(value)) return {};
+    errorAt_ = event.id;
+    return "\"" + event.text + "\" is not a number; the range in effect is kept";
+  }
+  const bool ticking = check && widget == check && check->GetCheckState() != 1;
+  if (!ticking && widget != rowWidget->FindDescendant("RangeButton")) return {};
+  QelHostPanelRow row;
+  row.row = QelVar<QelVidWidget>::Retain(rowWidget);
+  row.kind = QelHostPanelRow::Kind::Range;
+  row.state = check ? check->GetCheckState() : 0;
+  const int index = combo->GetSelectedIndex();
+  const std::string lower = index >= 0 && index < combo->GetLineCount() ? combo->GetLine(index).Utf8() : std::string();
+  const double low = std::strtod(left->GetText().Utf8().c_str(), nullptr);
+  const double high = std::strtod(right->GetText().Utf8().c_str(), nullptr);
+  std::string why = QelHostPanel::RangeProblem(row, lower, low, true, high, ticking);
+  if (!why.empty()) {
+    errorAt_ = IdOf(root, why.find("upper") != std::string::npos ? right : left);
+    why += "; the range in effect is kept";
+  }
+  return why;
+}
+
 bool QelHostWebApi::Dispatch(const QelHostWebEvent& event, std::string& error) {
+  errorAt_.clear();
   QelDbrFraPanel* panel = QelHostPanel::Find(session_.Editor());
   if (!panel) {
     error = "no panel is open";
@@ -223,6 +399,10 @@ bool QelHostWebApi::Dispatch(const QelHostWebEvent& event, std::string& error) {
   }
   if (!IsOnPage(widget) || !widget->IsEnabled()) {
     error = named + (widget->IsEnabled() ? " is hidden" : " is disabled");
+    return false;
+  }
+  if (std::string why = RangeRefusal(panel, widget, event); !why.empty()) {
+    error = why;
     return false;
   }
   // The widget's own dispatch may rebuild the dialog; the old widgets go when idle.
@@ -286,7 +466,9 @@ QelHostWebReply QelHostWebApi::Event(std::string_view body) {
   QelHostWebEvent event;
   std::string error;
   Changes changes;
-  if (!QelHostWebRequest::ParseEvent(body, event, error) || !Run(event, changes, error)) return Error(400, error);
+  errorAt_.clear();
+  if (!QelHostWebRequest::ParseEvent(body, event, error) || !Run(event, changes, error))
+    return Error(400, error, errorAt_);
   return StateWith(changes);
 }
 
@@ -364,6 +546,10 @@ QelHostWebReply QelHostWebApi::Activate(std::string_view body) {
   BeginChanges();
   const HRESULT activated = browser_->Activate(chosen.get());
   Changes changes = EndChanges();
+  if (activated == S_OK) {
+    QelHostPanel::PressRefresh(session_.Editor());
+    if (QelVar<QelILumCapture>(chosen.get())) activatedCapture_ = NameOf(chosen.get());
+  }
   QelDelayedDestruction::FlushIdle();
   if (activated != S_OK) return Error(400, "item " + std::to_string(item) + " cannot be activated");
   ++version_;
@@ -402,6 +588,7 @@ std::string QelHostWebApi::DrawPicture(int width, int height) {
   offscreen->SetTextSprites(1);
   std::string png;
   if (offscreen->Draw() != S_OK || !QelPngWriter::Encode(*image, png)) return "the picture could not be made";
+  unplaced_ = offscreen->GetUnplacedLabels();
   picture_ = std::move(png);
   pictureVersion_ = version_;
   pictureWidth_ = width;

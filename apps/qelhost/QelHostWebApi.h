@@ -27,6 +27,8 @@ struct QelHostWebReply {
   std::string body;
 };
 
+class QelVidWidget;
+
 class QelHostWebApi {
  public:
   explicit QelHostWebApi(QelHostSession& session);
@@ -39,6 +41,13 @@ class QelHostWebApi {
   QelHostWebReply Answer(std::string_view body);
   QelHostWebReply Camera(std::string_view body);
   QelHostWebReply Activate(std::string_view body);
+  // Clicks the panel back to how it read when the model opened (body: {} ).
+  QelHostWebReply Reset(std::string_view body);
+  // Makes a product UI-active, as a click in the product tree does (body: {"product": N},
+  // N from the State's "products"); the views browser follows it.
+  QelHostWebReply UiActive(std::string_view body);
+  // Switches the panel on again in the current workbench, saved, and shows it (body: {}).
+  QelHostWebReply OpenPanel(std::string_view body);
   // The 3D viewer's picture as PNG; the size is clamped to 64..2048.
   QelHostWebReply Picture(int width, int height);
   QelHostWebReply Thumbnail(int item);
@@ -64,6 +73,10 @@ class QelHostWebApi {
   // event names no widget that takes it.
   bool Run(const QelHostWebEvent& event, Changes& changes, std::string& error);
   bool Dispatch(const QelHostWebEvent& event, std::string& error);
+  // Why a range entry or a range's tick cannot apply, with the box it is about in
+  // `errorAt_`; empty when it can.
+  std::string RangeRefusal(QelVidWidget* panel, QelVidWidget* widget, const QelHostWebEvent& event);
+  std::string ProductsJson();
   QelHostWebReply StateWith(const Changes& changes);
   std::string BrowserJson();
   // Draws and encodes the picture for the current version; the reason when it cannot.
@@ -93,4 +106,8 @@ class QelHostWebApi {
   int servedVersion_ = 0;    // of the picture last sent
   int preparedVersion_ = 0;  // the last version PreparePicture tried
   std::string picture_;
+  std::vector<std::string> unplaced_;  // labels the last picture could not place
+  std::string errorAt_;  // the widget id a refusal is about, for the page to mark
+  std::vector<QelBaseUnknown_var> products_;  // in the model's order, for "products"
+  std::string activatedCapture_;
 };

@@ -209,7 +209,10 @@ void QelHostWebServer::Routes() {
   const std::pair<const char*, Call> posts[] = {{"/api/event", &QelHostWebApi::Event},
                                                 {"/api/answer", &QelHostWebApi::Answer},
                                                 {"/api/camera", &QelHostWebApi::Camera},
-                                                {"/api/activate", &QelHostWebApi::Activate}};
+                                                {"/api/activate", &QelHostWebApi::Activate},
+                                                {"/api/reset", &QelHostWebApi::Reset},
+                                                {"/api/ui-active", &QelHostWebApi::UiActive},
+                                                {"/api/open-panel", &QelHostWebApi::OpenPanel}};
   for (const auto& [path, call] : posts) {
     http.Post(path, [this, call = call](const httplib::Request&, httplib::Response& response,
                                         const httplib::ContentReader& read) {

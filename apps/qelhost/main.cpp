@@ -46,8 +46,9 @@ struct SysLogNotice {
   }
 };
 
-// Prints or writes the requested user settings; false when one could not be done.
-bool HandleSettings(const std::vector<QelHostOptions::SettingRequest>& requests) {
+// Prints or writes the requested user settings; false when one could not be done. `alone`:
+// nothing else was asked, so each value is printed by itself, for a script to read.
+bool HandleSettings(const std::vector<QelHostOptions::SettingRequest>& requests, bool alone) {
   bool ok = true;
   for (const auto& request : requests) {
     QelSettingRepository* repository = QelSettingRepository::GetRepository(request.repository.c_str());
@@ -78,12 +79,19 @@ bool HandleSettings(const std::vector<QelHostOptions::SettingRequest>& requests)
     }
     int number = 0;
     QelString text;
-    if (repository->ReadSetting(key, number) == S_OK)
-      std::printf("setting %s/%s = %d\n", request.repository.c_str(), key, number);
-    else if (repository->ReadSetting(key, text) == S_OK)
-      std::printf("setting %s/%s = \"%s\"\n", request.repository.c_str(), key, text.CastToCharPtr());
-    else
+    if (repository->ReadSetting(key, number) == S_OK) {
+      if (alone) std::printf("%d\n", number);
+      else std::printf("setting %s/%s = %d\n", request.repository.c_str(), key, number);
+    } else if (repository->ReadSetting(key, text) == S_OK) {
+      if (alone) std::printf("%s\n", text.CastToCharPtr());
+      else std::printf("setting %s/%s = \"%s\"\n", request.repository.c_str(), key, text.CastToCharPtr());
+    } else if (alone) {
+      std::fprintf(stderr, "qelhost: %s/%s is not set (%s)\n", request.repository.c_str(), key,
+                   repository->GetFilePath().c_str());
+      ok = false;
+    } else {
       std::printf("setting %s/%s is not set (%s)\n", request.repository.c_str(), key, repository->GetFilePath().c_str());
+    }
   }
   return ok;
 }
@@ -180,6 +188,12 @@ int main(int argc, char** argv) {
     return 0;
   }
 
+  // Only settings asked: no model, no plug-in, just the values.
+  if (!options.settings.empty() && options.modelPath.empty() && options.scriptPath.empty() && !options.demo &&
+      options.exportJsonPath.empty() && options.displayChanges.empty() && !options.defaultOnly &&
+      !options.tolerance && !options.serve && !options.listModule)
+    return HandleSettings(options.settings, true) ? 0 : 1;
+
   const int64_t objectsBefore = QelBaseUnknown::LiveObjectCount();
   QelBaseUnknown_var root;
   HRESULT loaded = options.modelPath.empty()
@@ -201,7 +215,7 @@ int main(int argc, char** argv) {
   std::fflush(stdout);
   void* module = QelHostPlugin::Load(options.modulePath, options.listModule, std::cout);
   if (!module) return 1;
-  if (!HandleSettings(options.settings)) return 1;
+  if (!HandleSettings(options.settings, false)) return 1;
   if (!ApplyDisplayChanges(root.get(), options.displayChanges)) return 1;
   if (options.defaultOnly || options.tolerance) ApplyFilter(root.get(), options);
   if (options.serve) {

@@ -182,3 +182,21 @@ TEST_F(LightContextTest, ContextStaysSoundAcrossRefillsAndAnUnresetRelease) {
   EXPECT_EQ(browser_->GetRebuildCount(), 0);
   root_ = nullptr;
 }
+
+// A product made UI-active before the browser opens: the browser lists that product's own
+// sets at once, not the root's.
+TEST_F(LightContextTest, ABrowserOpenedWhileAProductIsUIActiveListsThatProductsSets) {
+  auto part = b_.AddProduct(b_.Root(), {.alias = "Part"});
+  b_.AddCapture(b_.AddSet(part, {.alias = "Own", .light = true}), {.alias = "C"});
+  b_.AddSet(b_.Root(), {.alias = "RootSet", .light = true, .rootScope = QelRootSetScope::Direct});
+  ShowModel();
+  ASSERT_EQ(OpenBrowser(), S_OK);
+  EXPECT_EQ(NodeNames(), (std::vector<std::string>{"Root/RootSet"}));
+  browser_->Close();
+  auto path = RootPath();
+  path->AddChildElement(part.get());
+  editor_->SetUIActivePath(path.get());
+  ASSERT_EQ(OpenBrowser(), S_OK);
+  EXPECT_EQ(NodeNames(), (std::vector<std::string>{"Part/Own"}));
+  EXPECT_EQ(ItemsOf("Part/Own"), (std::vector<std::string>{"C"}));
+}

@@ -71,8 +71,9 @@ class ToolboxTest : public ::testing::Test {
     for (const char* name : {"A1", "A2", "A3"})
       annotations_.push_back(b_.AddAnnotation(set_, {.alias = name, .typeName = "Datum", .anchor = {0, 0, 0}}));
   }
-  QelBaseUnknown_var View(const char* alias, std::vector<QelBaseUnknown*> elements, QelMathPlane plane = Plane({0, 0, 1})) {
-    return b_.AddView(set_, {.alias = alias, .plane = plane, .elements = elements});
+  QelBaseUnknown_var View(const char* alias, std::vector<QelBaseUnknown*> elements, QelMathPlane plane = Plane({0, 0, 1}),
+                          bool section = false) {
+    return b_.AddView(set_, {.alias = alias, .plane = plane, .elements = elements, .extraction = section});
   }
   QelVar<Qel3DViewer> Viewer() {
     auto viewer = QelMakeVar<Qel3DViewer>(300, 100);
@@ -225,7 +226,7 @@ TEST_F(ToolboxTest, ViewWithoutCaptureShowsOnlyItsElements) {
 
 TEST_F(ToolboxTest, LinkedCaptureUsesItsFilterAndTheViewsClipping) {
   BuildSet();
-  QelBaseUnknown_var view = View("V", {annotations_[0].get()}, Plane({0, 0, 1}, {0, 0, 5}));
+  QelBaseUnknown_var view = View("V", {annotations_[0].get()}, Plane({0, 0, 1}, {0, 0, 5}), true);
   QelBaseUnknown_var capture = b_.AddCapture(set_, {.alias = "C", .view = view.get()});
   struct Spy : QelIVisuSceneSource {
     void CollectScene(QelRenderScene&, QelIVisuObjectFilter* filter) override {
@@ -367,7 +368,8 @@ TEST_F(ToolboxTest, FactoriesFilterOtherSetsAndClipInTheContext) {
   QelBaseUnknown_var mine = b_.AddAnnotation(set_, {.alias = "M", .typeName = "Datum"});
   QelBaseUnknown_var other = b_.AddSet(b_.Root(), {.alias = "Other", .light = true});
   QelBaseUnknown_var theirs = b_.AddAnnotation(other, {.alias = "T", .typeName = "Datum"});
-  QelBaseUnknown_var view = View("V", {mine.get()}, Plane({0, 0, 1}, {0, 0, 5}));
+  QelBaseUnknown_var view = View("V", {mine.get()}, Plane({0, 0, 1}, {0, 0, 5}), true);
+  QelBaseUnknown_var plain = View("P", {mine.get()}, Plane({0, 0, 1}, {0, 0, 5}));
   QelBaseUnknown_var capture = b_.AddCapture(set_, {.alias = "C", .view = view.get()});
   auto path = RootPath();
   path->AddChildElement(part.get());
@@ -379,7 +381,13 @@ TEST_F(ToolboxTest, FactoriesFilterOtherSetsAndClipInTheContext) {
   ASSERT_EQ(filters->GetFilter(path.get(), false, filter), S_OK);
   EXPECT_TRUE(filter->IsFilteredOut(theirs.get()));
   EXPECT_FALSE(filter->IsFilteredOut(mine.get()));
-  EXPECT_EQ(filters->GetFilter(path.get(), true, filter), S_FALSE) << "the view holds all of its set";
+  // What the view holds is drawn even while the display hides it, as activating shows it.
+  EXPECT_TRUE(filter->IsKeptIn(mine.get()));
+  EXPECT_TRUE(filter->IsKeptIn(set_.get()));
+  EXPECT_FALSE(filter->IsKeptIn(theirs.get()));
+  ASSERT_EQ(filters->GetFilter(path.get(), true, filter), S_OK) << "the view holds all of its set";
+  EXPECT_FALSE(filter->IsFilteredOut(theirs.get()));
+  EXPECT_TRUE(filter->IsKeptIn(mine.get()));
 
   QelVar<QelIDriClippingFactory> clippings{view.get()};
   ASSERT_TRUE(clippings);
@@ -387,5 +395,8 @@ TEST_F(ToolboxTest, FactoriesFilterOtherSetsAndClipInTheContext) {
   ASSERT_EQ(clippings->GetClipping(path.get(), true, clipping), S_OK);
   EXPECT_DOUBLE_EQ(clipping->GetPlane().DistanceTo({0, 0, 105}), 0.0) << "the part's plane, placed in the root";
   EXPECT_EQ(QelVar<QelIDriClippingFactory>(capture.get())->GetClipping(path.get(), true, clipping), S_FALSE);
+  EXPECT_FALSE(clipping);
+  // Only a section view cuts the model.
+  EXPECT_EQ(QelVar<QelIDriClippingFactory>(plain.get())->GetClipping(path.get(), true, clipping), S_FALSE);
   EXPECT_FALSE(clipping);
 }

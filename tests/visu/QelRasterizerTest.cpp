@@ -170,9 +170,32 @@ TEST(QelRasterizerTest, LabelsSharingAnAnchorMoveAsideInsteadOfCovering) {
   // shown stay whole: the first one's frame is not covered by the last.
   scene.annotations.assign(5000, {{0, 0, 0}, {}, {0, 1, 0}, "crowded"});
   scene.annotations.front().color = {1, 0, 0};
-  QelRasterizer::Render(scene, view, *image);
+  std::vector<std::string> unplaced;
+  QelRasterizer::Render(scene, view, *image, &unplaced);
   EXPECT_GT(CountColor(*image, 255, 0, 0), 150);
   EXPECT_TRUE(HasColor(*image, 0, 255, 0));
+  // None goes without a word: every label left at its mark is named.
+  EXPECT_GT(unplaced.size(), 4000u);
+  EXPECT_LT(unplaced.size(), 5000u);
+  EXPECT_EQ(unplaced.front(), "crowded");
+}
+
+// A label whose place up and right of its anchor would leave the picture is moved inside
+// it whole, and counts as placed.
+TEST(QelRasterizerTest, LabelsNearTheBorderStayWholeInsideThePicture) {
+  QelRenderView view = LookDownZ(10);
+  view.background = {0, 0, 0};
+  auto image = QelMakeVar<QelPixelImage>(64, 48);
+  // Anchors at the right and the top edges of the picture.
+  for (const QelMathPoint anchor : {QelMathPoint{2.6, 0, 0}, QelMathPoint{0, 2.0, 0}}) {
+    QelRenderScene scene;
+    scene.annotations.push_back({anchor, {}, {1, 0, 0}, "edge"});
+    std::vector<std::string> unplaced;
+    QelRasterizer::Render(scene, view, *image, &unplaced);
+    EXPECT_TRUE(unplaced.empty());
+    // Without texts a frame is 30 x 16 with a border of 2: its paper is 26 x 12, all inside.
+    EXPECT_EQ(CountColor(*image, 250, 250, 245), 26 * 12) << anchor.x << ", " << anchor.y;
+  }
 }
 
 TEST(QelPngWriterTest, PicturesReadBackExactlyWhateverTheirSizeAndContent) {

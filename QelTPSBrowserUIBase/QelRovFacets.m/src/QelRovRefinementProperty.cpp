@@ -114,6 +114,7 @@ QelRovFacetProperty* QelRovRefinementProperty::ResolveProperty(QelBaseUnknown_va
 void QelRovRefinementProperty::ReadPropertyFacts(QelRovFacetProperty* property) {
   property->GetName(propertyName_);
   property->IsChecked(checked_);
+  partial_ = property->GetCheckState() == PartiallyChecked;
   radio_ = (property->GetFlags() & QelRovFacetProperty::FlagRadio) != 0;
   icon_ = QelUnicodeString();
   property->GetIconName(icon_);
@@ -321,7 +322,9 @@ QelUnicodeString QelRovRefinementProperty::GetRightValue() const {
 }
 
 void QelRovRefinementProperty::OnClick(QelBaseUnknown*, QelSYPEventArgs*) {
+  // A click on a mixed group ticks it, which ticks every item under it.
   checked_ = !checked_;
+  partial_ = false;
   SetChecked(checked_ ? 1 : 0);
 }
 

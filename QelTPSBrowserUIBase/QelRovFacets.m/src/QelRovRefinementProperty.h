@@ -65,7 +65,8 @@ class QelRovRefinementProperty : public QelVidCtl {
   QelVidColor GetLineColor() const;
   QelVidColor GetBorderColor() const;
   int GetIconVisibility() const;
-  int GetCheckState() const { return checked_ ? 1 : 0; }
+  // 2 for a group whose items differ: its box shows the mix rather than reading off.
+  int GetCheckState() const { return checked_ ? 1 : partial_ ? 2 : 0; }
   int GetExpandedFlag() const;
   int GetCheckBoxVisibility() const;
   int GetRadioVisibility() const;
@@ -123,6 +124,7 @@ class QelRovRefinementProperty : public QelVidCtl {
   // Read once per row: every binding of the row's template asks for them.
   QelUnicodeString icon_;
   bool radio_ = false;
+  bool partial_ = false;
   bool factsRead_ = false;
   QelVidLayGrid* grid_ = nullptr;
   bool alternate_ = false;

@@ -1,8 +1,8 @@
 #pragma once
 // QelDbrDisplayCaptureCommand: the command behind the header "QelTPSDisplayCaptureHdr". It
 // takes the capture selected in the current editor, puts the capture's viewpoint on the
-// current window's viewer and shows the capture, its linked view and what that view holds,
-// hiding the other annotations of the capture's set. Static; no state.
+// current window's viewer and shows the capture, its set, its linked view and what that view
+// holds, hiding every other annotation of the model. Static; no state.
 #include "QelVar.h"
 
 class Qel3DViewer;

@@ -18,6 +18,9 @@ class QelDbrFilter : public QelIVisuObjectFilter {
   QelIDriFilterComponent* GetComponent(int index) const;
 
   bool IsFilteredOut(QelBaseUnknown* object) override;
+  // Objects drawn even while hidden (what a capture's activation would show).
+  void Keep(QelBaseUnknown* object);
+  bool IsKeptIn(QelBaseUnknown* object) override;
 
  protected:
   ~QelDbrFilter() override = default;
@@ -27,4 +30,5 @@ class QelDbrFilter : public QelIVisuObjectFilter {
   int type_;
   QelVar<QelPathElement> root_;
   std::vector<QelVar<QelIDriFilterComponent>> components_;
+  std::vector<QelBaseUnknown_var> kept_;
 };

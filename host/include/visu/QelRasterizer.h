@@ -2,7 +2,8 @@
 // QelRasterizer: draws a QelRenderScene into a pixel image with a z-buffer: pure functions
 // of their arguments, no render state kept between calls. Shapes are flat or Lambert
 // shaded with a light at the eye; back faces are culled unless clipping opens the shapes,
-// then drawn darker. Annotation marks are drawn over the shapes.
+// then drawn flat and hatched as the cut's cap. Annotation marks are drawn over the shapes.
+#include <string>
 #include <vector>
 
 #include "QelMathPlane.h"
@@ -24,6 +25,8 @@ struct QelRenderView {
 };
 
 namespace QelRasterizer {
-// Fills `image` with the background and draws `scene` seen from `view`.
-void Render(const QelRenderScene& scene, const QelRenderView& view, QelPixelImage& image);
+// Fills `image` with the background and draws `scene` seen from `view`. The texts of the
+// labels that found no free place are appended to `unplaced` when given.
+void Render(const QelRenderScene& scene, const QelRenderView& view, QelPixelImage& image,
+            std::vector<std::string>* unplaced = nullptr);
 }  // namespace QelRasterizer

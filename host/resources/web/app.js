@@ -28,6 +28,16 @@
     capture: 'Capture',
     view: 'View',
     noJson: 'the host answered something that is not JSON',
+    filters: 'Filters:',
+    noFilter: 'no filter',
+    undo: (part) => `Undo: ${part}`,
+    reset: 'Reset',
+    resetTitle: 'Every facet back to how it read when the model opened',
+    notDrawn: (count) => `${count} not drawn`,
+    notDrawnMore: (rest) => `and ${rest} more`,
+    products: 'Product',
+    openPanel: 'Open the panel',
+    unplaced: (count, names) => `${count} label(s) not placed, marks only: ${names}`,
     noPicture: 'the picture could not be loaded',
     parts: {
       LeftEditor: 'lower value', LeftCombo: 'lower operator',
@@ -64,7 +74,13 @@
     }
     if (!response.ok) {
       const reason = data && data.error ? data.error : text.trim() || response.statusText;
-      throw new Error(`${response.status}: ${reason}`);
+      const error = new Error(`${response.status}: ${reason}`);
+      // The box a refused entry is about, marked beside it.
+      if (data && data.at) {
+        error.at = data.at;
+        error.reason = reason;
+      }
+      throw error;
     }
     if (!data) throw new Error(words.noJson);
     return data;
@@ -101,6 +117,20 @@
     const status = $('status');
     status.textContent = words.notDone(error.message);
     status.classList.add('error');
+    if (error.at) markBox(error.at, error.reason);
+  }
+
+  function markBox(id, reason) {
+    const box = $('panel').querySelector(`[data-wid="${CSS.escape(id)}"]`);
+    if (!box) return;
+    box.classList.add('invalid');
+    box.setAttribute('aria-invalid', 'true');
+    box.title = reason;
+    const note = el('span', 'box-error', reason);
+    note.setAttribute('role', 'alert');
+    note.id = `why-${id}`;
+    box.setAttribute('aria-describedby', note.id);
+    box.after(note);
   }
 
   // ---- State ----------------------------------------------------------------------------
@@ -114,11 +144,96 @@
     $('status').classList.remove('error');
     setText($('status'), '');
     if (!keepPanel) drawPanel(state.panel);
+    drawFilters(state.filters, !!state.panel);
+    drawNotDrawn(state.notDrawn, keepPanel);
+    drawProducts(state.products);
     drawBrowser(state.browser);
     drawDisplay(state.display, state.changes);
+    const unplaced = state.unplaced || [];
+    const named = unplaced.length > 6 ? words.more(unplaced.slice(0, 6).join(', '), unplaced.length - 6) : unplaced.join(', ');
+    setText($('unplaced'), unplaced.length ? words.unplaced(unplaced.length, named) : '');
     view.serial += 1;
     document.body.dataset.serial = String(view.serial);
     if (state.question) ask(state.question);
+  }
+
+  // One button per filter in effect: a click undoes it. Reset brings the opening state.
+  function drawFilters(filters, hasPanel) {
+    const host = $('filters');
+    const parts = [el('span', 'filters-head', words.filters)];
+    if (!filters || filters.length === 0) parts.push(el('span', 'filter none', words.noFilter));
+    for (const part of filters || []) {
+      if (!part.undo) {
+        parts.push(el('span', 'filter', part.text));
+        continue;
+      }
+      const button = el('button', 'filter', `${part.text} ✕`);
+      button.type = 'button';
+      button.title = words.undo(part.text);
+      button.setAttribute('aria-label', words.undo(part.text));
+      button.addEventListener('click', () => sendEvent(part.undo, 'click'));
+      parts.push(button);
+    }
+    const reset = el('button', 'reset', words.reset);
+    reset.type = 'button';
+    reset.id = 'reset';
+    reset.title = words.resetTitle;
+    reset.disabled = !hasPanel;
+    reset.addEventListener('click', () => post('/api/reset', {}));
+    parts.push(reset);
+    host.replaceChildren(...parts);
+  }
+
+  // The annotations not drawn, each with why; a row of the panel standing for one says the
+  // same when hovered.
+  function drawNotDrawn(notDrawn, keepPanel) {
+    const box = $('not-drawn');
+    if (!notDrawn) return;
+    const open = box.open;
+    const items = notDrawn.listed.map((entry) => {
+      const item = el('li');
+      item.appendChild(el('b', null, entry.name));
+      item.appendChild(document.createTextNode(`: ${entry.why.join('; ')}`));
+      return item;
+    });
+    if (notDrawn.count > notDrawn.listed.length) items.push(el('li', null, words.notDrawnMore(notDrawn.count - notDrawn.listed.length)));
+    const summary = el('summary', null, words.notDrawn(notDrawn.count));
+    const list = el('ul');
+    list.append(...items);
+    box.replaceChildren(summary, list);
+    box.open = open;
+    if (keepPanel) return;
+    const why = new Map(notDrawn.listed.map((entry) => [entry.row, `${entry.name}: ${entry.why.join('; ')}`]));
+    $('panel').querySelectorAll('.row.property').forEach((row) => {
+      const caption = row.querySelector(':scope > label.caption');
+      const text = caption ? caption.textContent.trim() : '';
+      if (why.has(text)) {
+        row.title = why.get(text);
+        row.classList.add('not-drawn');
+      }
+    });
+  }
+
+  // The product tree: a click makes a product UI-active, and the browser follows it.
+  function drawProducts(products) {
+    const host = $('products');
+    if (!products || products.length < 2) {
+      host.replaceChildren();
+      return;
+    }
+    const list = el('ul', 'products');
+    list.setAttribute('aria-label', words.products);
+    for (const product of products) {
+      const item = el('li');
+      item.style.paddingLeft = `${product.depth}em`;
+      const button = el('button', 'product', product.name);
+      button.type = 'button';
+      button.setAttribute('aria-pressed', String(product.active));
+      button.addEventListener('click', () => post('/api/ui-active', { product: product.product }));
+      item.appendChild(button);
+      list.appendChild(item);
+    }
+    host.replaceChildren(list);
   }
 
   // Texts are set only when they differ: an equal text set again still counts as a change
@@ -203,7 +318,9 @@
         button.type = 'button';
         button.disabled = off;
         if (context.row && words.parts[node.name]) button.setAttribute('aria-label', `${context.row}: ${words.parts[node.name]}`);
-        button.addEventListener('click', () => sendEvent(node.id, 'click'));
+        // Closing is kept for the next start: the person is asked first.
+        if (node.name === 'CloseButton') button.addEventListener('click', () => confirmClose(node.id));
+        else button.addEventListener('click', () => sendEvent(node.id, 'click'));
         return button;
       }
       case 'CheckButton': {
@@ -381,9 +498,9 @@
     const typing = focused && focused.matches('input.editor') && focused.dataset.typing
       ? { value: focused.value, start: focused.selectionStart, end: focused.selectionEnd } : null;
 
-    const root = panel ? drawWidget(panel, false, {}) : el('p', 'empty', words.noPanel);
+    const root = panel ? drawWidget(panel, false, {}) : noPanel();
     view.rebuilding = true;
-    host.replaceChildren(root || el('p', 'empty', words.noPanel));
+    host.replaceChildren(root || noPanel());
     view.rebuilding = false;
     // The containers above the scrolled area share the pane's height, so only the rows scroll.
     for (let node = host.querySelector('.scroll'); node && node !== host; node = node.parentElement) {
@@ -415,6 +532,27 @@
         }
       }
     }
+  }
+
+  // Without a panel the page offers to open it again: nobody needs a command line for it.
+  function noPanel() {
+    const box = el('div', 'empty');
+    box.appendChild(el('p', null, words.noPanel));
+    const open = el('button', 'open-panel', words.openPanel);
+    open.type = 'button';
+    open.id = 'open-panel';
+    open.addEventListener('click', () => post('/api/open-panel', {}));
+    box.appendChild(open);
+    return box;
+  }
+
+  function confirmClose(id) {
+    const dialog = $('close-question');
+    dialog.returnValue = '';
+    dialog.onclose = () => {
+      if (dialog.returnValue === 'yes') sendEvent(id, 'click');
+    };
+    dialog.showModal();
   }
 
   // ---- the views browser ----------------------------------------------------------------

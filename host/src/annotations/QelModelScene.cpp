@@ -58,12 +58,17 @@ void QelModelScene::CollectScene(QelRenderScene& scene, QelIVisuObjectFilter* fi
   int index = 0;
   CollectProducts(root, QelMathTransformation(), index, scene, filter, placed);
   for (const auto& set : model->Sets()) {
-    if (!set->IsShown() || (filter && filter->IsFilteredOut(set.get()))) continue;
+    // A filter may keep in what the display hides (a capture's preview), never the reverse.
+    const auto drawn = [filter](QelModelObject* object) {
+      if (filter && filter->IsFilteredOut(object)) return false;
+      return object->IsShown() || (filter && filter->IsKeptIn(object));
+    };
+    if (!drawn(set.get())) continue;
     QelBaseUnknown* owner = set->Owner();
     auto at = placed.find(owner ? owner->GetImpl() : nullptr);
     const QelMathTransformation toRoot = at == placed.end() ? QelMathTransformation() : at->second;
     for (const auto& annotation : set->Annotations()) {
-      if (!annotation->IsShown() || (filter && filter->IsFilteredOut(annotation.get()))) continue;
+      if (!drawn(annotation.get())) continue;
       QelRenderAnnotation mark;
       QelMathPoint anchor;
       annotation->GetAnchor(anchor);

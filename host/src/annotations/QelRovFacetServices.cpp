@@ -75,8 +75,12 @@ HRESULT QelRovFacetServices::ListARMOrDirectSets(QelBaseUnknown* root, QelListVa
                                                  bool /*flag*/) {
   QelAnnotationModel* model = QelAnnotationModel::Of(root);
   if (!model) return E_FAIL;
+  // A product below the root (made UI-active) is the root of its own sets: those it owns.
+  auto* product = dynamic_cast<QelPLMProductOccurrence*>(root->GetImpl());
+  const bool below = product && product != model->Root();
   for (const auto& set : model->Sets()) {
-    if (set->RootScope() != QelRootSetScope::None) list.Append(static_cast<QelILumSet*>(set.get()));
+    const bool take = below ? set->Owner() && set->Owner()->IsEqual(product) : set->RootScope() != QelRootSetScope::None;
+    if (take) list.Append(static_cast<QelILumSet*>(set.get()));
   }
   return S_OK;
 }

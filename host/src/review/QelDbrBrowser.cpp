@@ -58,7 +58,11 @@ HRESULT QelDbrBrowser::Open(QelBaseUnknown* object, QelFrmEditor* editor) {
     QelCallbackManager::Get().AddCallback(editor, kQelUIActiveObjectChanged, static_cast<QelIDbrBrowser*>(this),
                                           [this](QelBaseUnknown*, QelBaseUnknown*) { FollowUIActiveObject(); });
   }
-  return Refresh() == S_OK ? S_OK : E_FAIL;
+  if (Refresh() != S_OK) return E_FAIL;
+  // Opened while another product is UI-active, the browser shows that product's sets at once.
+  QelBaseUnknown_var active = editor && editor->GetUIActivePath() ? editor->GetUIActivePath()->GetLeaf() : nullptr;
+  if (active && !active->IsEqual(object)) FollowUIActiveObject();
+  return S_OK;
 }
 
 HRESULT QelDbrBrowser::Close() {
@@ -131,7 +135,12 @@ HRESULT QelDbrBrowser::Activate(QelBaseUnknown* item) {
   QelVar<QelIVIABaseUI> ui{item};
   if (!ui) return E_FAIL;
   QelBaseUnknown_var editorObject = editor_.Get();
-  if (auto* editor = QelSysDynamicCast<QelFrmEditor>(editorObject.get())) editor->SetSelection(item);
+  // Chosen afresh even when it is already selected: activating changes the display, and
+  // whoever follows the selection must hear of it again.
+  if (auto* editor = QelSysDynamicCast<QelFrmEditor>(editorObject.get())) {
+    editor->SetSelection(nullptr);
+    editor->SetSelection(item);
+  }
   return ui->ActivateItem();
 }
 

@@ -59,14 +59,18 @@ HRESULT QelDbrDisplayCaptureCommand::Display(QelBaseUnknown* captureObject, Qel3
   QelVar<QelILumCapture> capture{captureObject};
   QelBaseUnknown_var setObject;
   if (!capture || !viewer || capture->GetSet(setObject) != S_OK) return E_FAIL;
-  QelVar<QelILumSet> set{setObject.get()};
   QelBaseUnknown_var view;
   bool linked = false;
   if (capture->IsLinkedToView(linked) == S_OK && linked) capture->GetLinkedView(view);
 
-  // What the capture shows: itself, its view and the view's elements; the rest of the set
-  // is hidden.
+  QelBaseUnknown_var root;
+  QelRovFacetServices::GetRootPLMObject(QelFrmEditor::GetCurrentEditor(), root);
+
+  // What the capture shows: its set, itself, its view and the view's elements. Every other
+  // annotation of the model is hidden, whichever set holds it, so the display is exactly
+  // the view.
   QelListValQelBaseUnknown_var shown, hidden;
+  shown.Append(setObject);
   shown.Append(captureObject);
   QelVar<QelITPSView> asView{view.get()};
   QelVar<QelILumCollection> held;
@@ -74,18 +78,22 @@ HRESULT QelDbrDisplayCaptureCommand::Display(QelBaseUnknown* captureObject, Qel3
     shown.Append(view);
     if (asView->GetElements(held) == S_OK) ForEach(held.get(), [&](const QelBaseUnknown_var& e) { shown.Append(e); });
   }
-  QelVar<QelILumCollection> elements;
-  if (set && set->GetElements(elements) == S_OK)
-    ForEach(elements.get(), [&](const QelBaseUnknown_var& e) {
-      if (shown.Locate(e.get()) == 0) hidden.Append(e);
-    });
+  QelListValQelBaseUnknown_var sets;
+  if (root) QelRovFacetServices::ListAllSets(root.get(), sets, false);
+  if (sets.Locate(setObject.get()) == 0) sets.Append(setObject);
+  for (const QelBaseUnknown_var& each : sets) {
+    QelVar<QelILumSet> other{each.get()};
+    QelVar<QelILumCollection> elements;
+    if (other && other->GetElements(elements) == S_OK)
+      ForEach(elements.get(), [&](const QelBaseUnknown_var& e) {
+        if (shown.Locate(e.get()) == 0) hidden.Append(e);
+      });
+  }
   QelRovFacetServices::EnableDisableDisplay(hidden, 0, nullptr);
   QelRovFacetServices::EnableDisableDisplay(shown, 1, nullptr);
 
   // The viewpoint: the stored camera placed in the root's coordinates, or, without one,
   // square to the linked view.
-  QelBaseUnknown_var root;
-  QelRovFacetServices::GetRootPLMObject(QelFrmEditor::GetCurrentEditor(), root);
   Qel3DViewpoint* viewpoint = viewer->GetMain3DViewpoint();
   QelVar<QelICamera> camera;
   capture->GetCamera(camera);

@@ -27,3 +27,14 @@ bool QelDbrFilter::IsFilteredOut(QelBaseUnknown* object) {
   }
   return false;
 }
+
+void QelDbrFilter::Keep(QelBaseUnknown* object) {
+  if (object) kept_.push_back(QelBaseUnknown_var::Retain(object));
+}
+
+bool QelDbrFilter::IsKeptIn(QelBaseUnknown* object) {
+  if (!object) return false;
+  for (const auto& kept : kept_)
+    if (kept->IsEqual(object)) return true;
+  return false;
+}

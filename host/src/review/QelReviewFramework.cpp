@@ -10,6 +10,7 @@
 #include "QelIBuildPath.h"
 #include "QelIDriClippingFactory.h"
 #include "QelIDriFilterFactory.h"
+#include "QelITPSExtractionView.h"
 #include "QelILumCapture.h"
 #include "QelILumSet.h"
 #include "QelIPLMNavOccurrence.h"
@@ -94,10 +95,10 @@ class TieFilterFactory final : public QelTie<QelIDriFilterFactory> {
     }
     QelVar<QelILumSet> set{setObject.get()};
     if (!set) return E_FAIL;
-    std::vector<QelBaseUnknown_var> out;
+    std::vector<QelBaseUnknown_var> out, held;
     QelVar<QelILumCollection> elements;
     if (QelVar<QelITPSView> shown{view.get()}; shown && shown->GetElements(elements) == S_OK) {
-      std::vector<QelBaseUnknown_var> held, all;
+      std::vector<QelBaseUnknown_var> all;
       AddItems(elements.get(), held);
       QelVar<QelILumCollection> setElements;
       if (set->GetElements(setElements) == S_OK) AddItems(setElements.get(), all);
@@ -114,23 +115,28 @@ class TieFilterFactory final : public QelTie<QelIDriFilterFactory> {
         if (other->GetElements(otherElements) == S_OK) AddItems(otherElements.get(), out);
       }
     }
-    if (out.empty()) return S_FALSE;
+    if (out.empty() && held.empty()) return S_FALSE;
     filter = QelMakeVar<QelDbrFilter>(0, QelDbrFilterAndClippingController::GetRootPath(path).get());
     auto component = QelMakeVar<QelDbrFilterComponent>();
     for (const auto& e : out) component->AddPathElement(Sibling(path, e.get()).get());
     filter->AddFilterComponent(component.get());
+    // What the view holds is drawn as activating it shows it: its set and elements, even
+    // those the panel hides now.
+    if (!held.empty()) filter->Keep(set.get());
+    for (const auto& e : held) filter->Keep(e.get());
     return S_OK;
   }
 };
 
-// A view clips along its plane, placed in the context; a capture keeps no clipping.
+// A section (extraction) view clips along its plane, placed in the context; other views
+// and captures keep the model whole.
 class TieClippingFactory final : public QelTie<QelIDriClippingFactory> {
  public:
   using QelTie::QelTie;
   HRESULT GetClipping(QelPathElement* path, bool flag, QelVar<QelDbrClipping>& clipping) override {
     clipping = nullptr;
     QelVar<QelITPSView> view{GetImpl()};
-    if (!path || !view || !flag) return S_FALSE;
+    if (!path || !view || !flag || !QelVar<QelITPSExtractionView>(GetImpl())) return S_FALSE;
     QelMathPlane* plane = nullptr;
     if (view->GetPlane(plane) != S_OK || !plane) return S_FALSE;
     std::unique_ptr<QelMathPlane> owned(plane);

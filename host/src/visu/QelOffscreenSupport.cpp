@@ -48,7 +48,8 @@ HRESULT QelOffscreenSupport::Draw() {
   view.annotations = viewer->ViewMode(QelViewModeAnnotations) != 0;
   view.text = textSprites_ ? SharedText() : nullptr;
   updateSprites_ = 0;
-  QelRasterizer::Render(scene, view, *image_);
+  unplaced_.clear();
+  QelRasterizer::Render(scene, view, *image_, &unplaced_);
   return S_OK;
 }
 

@@ -61,7 +61,10 @@ struct Target {
   int width, height;
 };
 
-void FillTriangle(Target& t, const Vtx& a, const Vtx& b, const Vtx& c, const uint8_t rgb[3]) {
+// `hatch`, when given, is drawn on every sixth diagonal: the cap of a cut reads as solid
+// section rather than as an inner wall.
+void FillTriangle(Target& t, const Vtx& a, const Vtx& b, const Vtx& c, const uint8_t rgb[3],
+                  const uint8_t* hatch = nullptr) {
   const float area = (b.sx - a.sx) * (c.sy - a.sy) - (b.sy - a.sy) * (c.sx - a.sx);
   if (area == 0.0f || !std::isfinite(area)) return;
   const int x0 = std::max(0, static_cast<int>(std::floor(std::min({a.sx, b.sx, c.sx}))));
@@ -90,9 +93,10 @@ void FillTriangle(Target& t, const Vtx& a, const Vtx& b, const Vtx& c, const uin
         if (iz > zrow[x]) {
           zrow[x] = iz;
           uint8_t* p = prow + x * 3;
-          p[0] = rgb[0];
-          p[1] = rgb[1];
-          p[2] = rgb[2];
+          const uint8_t* ink = hatch && (x + y) % 6 == 0 ? hatch : rgb;
+          p[0] = ink[0];
+          p[1] = ink[1];
+          p[2] = ink[2];
         }
       }
       w0 += e0x;
@@ -192,14 +196,18 @@ void DrawMesh(Target& t, const Frame& f, const QelRenderView& view, const QelRen
     }
     float light = 1.0f;
     if (view.shading) light = 0.25f + 0.75f * std::abs(nx * fx + ny * fy + nz * fz) / nn;
-    if (!front) light *= 0.45f;
+    // An inner face seen through the cut stands for the cut face: flat and hatched, so the
+    // section reads as solid material whatever the wall's slope.
+    if (!front) light = 0.7f;
     const uint8_t rgb[3] = {Byte(mesh.color.r * light), Byte(mesh.color.g * light), Byte(mesh.color.b * light)};
+    const uint8_t ink[3] = {Byte(mesh.color.r * 0.35f), Byte(mesh.color.g * 0.35f), Byte(mesh.color.b * 0.35f)};
+    const uint8_t* hatch = front ? nullptr : ink;
     if (!any) {
       Vtx va, vb, vc;
       va.sx = sa.sx, va.sy = sa.sy, va.iz = sa.iz;
       vb.sx = sb.sx, vb.sy = sb.sy, vb.iz = sb.iz;
       vc.sx = sc.sx, vc.sy = sc.sy, vc.iz = sc.iz;
-      FillTriangle(t, va, vb, vc, rgb);
+      FillTriangle(t, va, vb, vc, rgb, hatch);
       continue;
     }
     if (cut[tri[0]] & cut[tri[1]] & cut[tri[2]] & 1) continue;
@@ -216,7 +224,7 @@ void DrawMesh(Target& t, const Frame& f, const QelRenderView& view, const QelRen
       pv[i].e = f.ToEye(poly[i]);
       Project(f, pv[i]);
     }
-    for (size_t i = 1; i + 1 < pv.size(); ++i) FillTriangle(t, pv[0], pv[i], pv[i + 1], rgb);
+    for (size_t i = 1; i + 1 < pv.size(); ++i) FillTriangle(t, pv[0], pv[i], pv[i + 1], rgb, hatch);
   }
 }
 
@@ -263,17 +271,18 @@ class LabelPlacer {
   }
 
   // The frame of size w x h for an anchor: up and right of it when that is free, else the
-  // first free place among rows stacked above and below it and the same on its left, inside
-  // the picture. None when all are taken: in a crowd, a frame covering others would only
-  // make both unreadable, so the anchor's mark alone stands for it.
+  // first free place among rows stacked above and below it and the same on its left. Each
+  // place is pushed inside the picture first, so a frame near the border is kept whole
+  // rather than cut. None when all are taken: in a crowd, a frame covering others would only
+  // make both unreadable, so the anchor's mark alone stands for it and the caller says so.
   std::optional<Box> Place(int ax, int ay, int w, int h) {
-    const Box first{ax + 6, ay - 6 - h, w, h};
+    const Box first = Within({ax + 6, ay - 6 - h, w, h});
     if (Free(first)) return Mark(first);
     for (int step = 1; step <= kSteps; ++step)
       for (const int dir : {-1, 1})
         for (const int left : {ax + 6, ax - 6 - w}) {
-          const Box b{left, first.top + dir * step * (h + 2), w, h};
-          if (Inside(b) && Free(b)) return Mark(b);
+          const Box b = Within({left, ay - 6 - h + dir * step * (h + 2), w, h});
+          if (Free(b)) return Mark(b);
         }
     return std::nullopt;
   }
@@ -281,7 +290,13 @@ class LabelPlacer {
  private:
   static constexpr int kCell = 32, kSteps = 12;
   static int CellCount(int pixels) { return std::max(1, (pixels + kCell - 1) / kCell); }
-  bool Inside(const Box& b) const { return b.left >= 0 && b.top >= 0 && b.left + b.w <= width_ && b.top + b.h <= height_; }
+  // `b` moved the least that puts it inside the picture (its top left corner first, for a
+  // frame larger than the picture).
+  Box Within(Box b) const {
+    b.left = std::max(0, std::min(b.left, width_ - b.w));
+    b.top = std::max(0, std::min(b.top, height_ - b.h));
+    return b;
+  }
   static bool Overlap(const Box& a, const Box& b) {
     return a.left < b.left + b.w && b.left < a.left + a.w && a.top < b.top + b.h && b.top < a.top + a.h;
   }
@@ -315,12 +330,13 @@ class LabelPlacer {
   std::vector<std::vector<int>> grid_;
 };
 
-void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& view, const QelRenderAnnotation& a,
+// False when the annotation's frame found no free place (its mark and leaders are drawn).
+bool DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& view, const QelRenderAnnotation& a,
                     LabelPlacer& labels) {
-  if (Clipped(view, a.anchor)) return;
+  if (Clipped(view, a.anchor)) return true;
   Vtx anchor;
   anchor.e = f.ToEye(a.anchor);
-  if (anchor.e.z < kNear) return;
+  if (anchor.e.z < kNear) return true;
   Project(f, anchor);
   const uint8_t rgb[3] = {Byte(a.color.r), Byte(a.color.g), Byte(a.color.b)};
   for (size_t i = 0; i + 1 < a.segments.size(); i += 2) {
@@ -344,7 +360,7 @@ void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
     Line(image, static_cast<int>(p.sx), static_cast<int>(p.sy), static_cast<int>(q.sx), static_cast<int>(q.sy), rgb);
   }
   const int ax = static_cast<int>(std::lround(anchor.sx)), ay = static_cast<int>(std::lround(anchor.sy));
-  if (ax < -1000 || ay < -1000 || ax > image.GetWidth() + 1000 || ay > image.GetHeight() + 1000) return;
+  if (ax < -1000 || ay < -1000 || ax > image.GetWidth() + 1000 || ay > image.GetHeight() + 1000) return true;
   for (int y = -2; y <= 2; ++y)
     for (int x = -2; x <= 2; ++x) Blend(image, ax + x, ay + y, rgb);
   // The frame sits up and right of its anchor, sized to the text it holds.
@@ -353,7 +369,7 @@ void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
   const int textHeight = view.text ? view.text->LineHeight() : 10;
   const int w = std::max(textWidth, 24) + 2 * pad, h = textHeight + 2 * pad;
   const std::optional<LabelPlacer::Box> box = labels.Place(ax, ay, w, h);
-  if (!box) return;
+  if (!box) return false;
   const int left = box->left, top = box->top;
   // A frame moved aside keeps a thin leader to its anchor.
   if (left != ax + 6 || top != ay - 6 - h)
@@ -368,10 +384,12 @@ void DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
     const QelRenderColor ink{a.color.r * 0.45f, a.color.g * 0.45f, a.color.b * 0.45f};
     view.text->Draw(image, left + pad, top + pad, a.text, ink);
   }
+  return true;
 }
 }  // namespace
 
-void QelRasterizer::Render(const QelRenderScene& scene, const QelRenderView& view, QelPixelImage& image) {
+void QelRasterizer::Render(const QelRenderScene& scene, const QelRenderView& view, QelPixelImage& image,
+                           std::vector<std::string>* unplaced) {
   const int width = image.GetWidth(), height = image.GetHeight();
   if (width == 0 || height == 0) return;
   const uint8_t bg[3] = {Byte(view.background.r), Byte(view.background.g), Byte(view.background.b)};
@@ -386,6 +404,7 @@ void QelRasterizer::Render(const QelRenderScene& scene, const QelRenderView& vie
   for (const QelRenderMesh& mesh : scene.meshes) DrawMesh(target, frame, view, mesh);
   if (view.annotations) {
     LabelPlacer labels(width, height);
-    for (const QelRenderAnnotation& a : scene.annotations) DrawAnnotation(image, frame, view, a, labels);
+    for (const QelRenderAnnotation& a : scene.annotations)
+      if (!DrawAnnotation(image, frame, view, a, labels) && unplaced) unplaced->push_back(a.text);
   }
 }
