@@ -17,6 +17,7 @@
 #include "QelILumSet.h"
 #include "QelIVIABaseUI.h"
 #include "QelListValQelUnicodeString.h"
+#include "QelModelBuilder.h"
 #include "QelModelObject.h"
 #include "QelModelScene.h"
 #include "QelOffscreenSupport.h"
@@ -203,6 +204,10 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
   body += ",\"changes\":" + Dump(json{{"shown", changes.shown}, {"hidden", changes.hidden}});
   body += ",\"display\":" + Dump(json{{"shown", shown}, {"hidden", hidden}});
   body += ",\"picture\":\"/api/picture.png?v=" + std::to_string(version_) + "\"";
+  json notRead = json::array();
+  for (const QelModelNotRead& missing : QelModelBuilder::NotRead(session_.Root()))
+    notRead.push_back({{"kind", missing.kind}, {"count", missing.count}, {"entities", missing.entities}});
+  body += ",\"notRead\":" + Dump(notRead);
   body += ",\"question\":" + Dump(question) + "}";
   return reply;
 }

@@ -203,6 +203,15 @@ bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out) {
   Json sets = Json::array();
   for (const auto& s : model->Sets()) sets.push_back(writer.Set(s.get()));
   doc["sets"] = std::move(sets);
+  if (!model->NotRead().empty()) {
+    Json notRead = Json::array();
+    for (const QelModelNotRead& n : model->NotRead()) {
+      Json item = {{"kind", n.kind}, {"count", n.count}};
+      if (!n.entities.empty()) item["entities"] = n.entities;
+      notRead.push_back(std::move(item));
+    }
+    doc["notRead"] = std::move(notRead);
+  }
   out << doc.dump(1) << '\n';
   return static_cast<bool>(out);
 }
