@@ -191,7 +191,7 @@ class Writer {
 };
 }  // namespace
 
-bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out) {
+bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out, bool indented) {
   QelAnnotationModel* model = QelAnnotationModel::Of(root);
   if (!model || !model->Root() || !root || model->Root()->GetImpl() != root->GetImpl()) return false;
   Writer writer;
@@ -212,7 +212,7 @@ bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out) {
     }
     doc["notRead"] = std::move(notRead);
   }
-  out << doc.dump(1) << '\n';
+  out << doc.dump(indented ? 1 : -1) << '\n';
   return static_cast<bool>(out);
 }
 

@@ -59,7 +59,8 @@ std::string Unquoted(std::string_view quoted) {
   return out;
 }
 
-// Refuses the text at `at`; the statement's entity is named when it has one.
+// One pass over the text, token by token; a refusal names the line and the entity of the
+// statement it stands in.
 class Scanner {
  public:
   Scanner(std::string_view text, std::vector<QelStepDataScan::Declared>& declared) : text_(text), declared_(declared) {}
@@ -121,6 +122,9 @@ class Scanner {
           if (!tokenSeen_) {
             id_ = id;
             naming_ = true;
+            defined_.push_back(id);
+          } else {
+            references_.push_back({id, begin_, id_});
           }
           Token(start);
           continue;
@@ -180,7 +184,7 @@ class Scanner {
         case ';':
           if (depth_ != 0) return Fail(i, "the statement ends inside a list (a ')' is missing)", error);
           if (i - statement_ > QelStepDataScan::kMaxStatementBytes) {
-            return Fail(statement_, "a statement longer than " +
+            return Fail(begin_, "a statement longer than " +
                                         std::to_string(QelStepDataScan::kMaxStatementBytes >> 20) + " MB", error);
           }
           EndStatement();
@@ -202,13 +206,14 @@ class Scanner {
           return Fail(i, "an unexpected character", error, c);
       }
     }
-    if (depth_ != 0) return Fail(statement_, "the file ends inside a list", error);
-    return true;
+    if (depth_ != 0) return Fail(begin_, "the file ends inside a list", error);
+    return CheckReferences(error);
   }
 
  private:
   // Every token but '=' and '(' ends the wait for a complex instance's opening.
-  void Token(size_t) {
+  void Token(size_t at) {
+    if (!tokenSeen_) begin_ = at;
     tokenSeen_ = true;
     afterEquals_ = false;
   }
@@ -239,6 +244,19 @@ class Scanner {
     // A number ends at a separator: a letter, point or quote glued to it is damage.
     return i >= n || !(IsWordChar(static_cast<unsigned char>(text_[i])) || text_[i] == '.' || text_[i] == '\'' ||
                        text_[i] == '#');
+  }
+
+  // A reference to an entity the file does not define is damage (a file cut short and its
+  // end put back, a number hit by a flipped byte); the translator would drop what holds it.
+  bool CheckReferences(std::string& error) {
+    std::sort(defined_.begin(), defined_.end());
+    for (const Reference& r : references_) {
+      if (std::binary_search(defined_.begin(), defined_.end(), r.id)) continue;
+      naming_ = r.from != 0;
+      id_ = r.from;
+      return Fail(r.statement, "refers to #" + std::to_string(r.id) + ", which the file does not define", error);
+    }
+    return true;
   }
 
   std::string Word(size_t start) const {
@@ -279,13 +297,22 @@ class Scanner {
     return false;
   }
 
+  struct Reference {
+    uint64_t id;
+    size_t statement;  // where the statement holding it begins
+    uint64_t from;     // that statement's entity, 0 for none
+  };
+
   std::string_view text_;
   std::vector<QelStepDataScan::Declared>& declared_;
+  std::vector<uint64_t> defined_;
+  std::vector<Reference> references_;
   std::vector<std::string_view> keywords_;
   std::string_view firstString_, lastString_;
   size_t depth_ = 0;
   size_t values_ = 0;  // separators in the statement so far
-  size_t statement_ = 0;
+  size_t statement_ = 0;  // where the statement's text begins (after the last ';')
+  size_t begin_ = 0;      // where its first token stands
   uint64_t id_ = 0;
   bool naming_ = false;       // the statement began with its #number
   bool tokenSeen_ = false;    // the statement has a token already

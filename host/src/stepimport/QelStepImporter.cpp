@@ -135,6 +135,23 @@ class ProductWalker {
   int unnamed_ = 0;
 };
 
+// The translator's one-time set-up (its protocol tables, the document application), done
+// in the caller once, so that each child inherits it instead of doing it again. Nothing of
+// a file is read here, and no worker thread is started: a forked child has none of the
+// caller's threads.
+void PrepareTranslator() {
+  static const bool prepared = [] {
+    SilenceTranslator();
+    STEPCAFControl_Reader reader;
+    Handle(XCAFApp_Application) application = XCAFApp_Application::GetApplication();
+    Handle(TDocStd_Document) document;
+    application->NewDocument("MDTV-XCAF", document);
+    application->Close(document);
+    return true;
+  }();
+  (void)prepared;
+}
+
 std::string ReadWhole(const std::string& path) {
   std::ifstream in(path, std::ios::binary);
   std::ostringstream text;
@@ -335,7 +352,7 @@ std::string TranslateToText(const std::string& path, const std::string& text, co
   std::string answer;
   for (const std::string& note : notes) answer += "N " + OneLine(note) + "\n";
   std::ostringstream model;
-  if (!QelModelJsonWriter::Write(root.get(), model)) return "E " + path + ": the imported model could not be written";
+  if (!QelModelJsonWriter::Write(root.get(), model, false)) return "E " + path + ": the imported model could not be written";
   answer += "M\n";
   answer += model.str();
   return answer;
@@ -380,6 +397,7 @@ HRESULT QelStepImporter::ImportFile(const std::string& path, QelBaseUnknown_var&
 
     // The translator is not safe against damaged data: it runs in a child process, so that
     // a crash or a runaway file costs the import, never the program.
+    PrepareTranslator();
     const QelStepChildProcess::Limits limits = LimitsFor(text.size());
     const QelStepChildProcess::Outcome outcome = QelStepChildProcess::Run(
         [&] { return TranslateToText(path, text, scan, annotated, options); }, limits);
