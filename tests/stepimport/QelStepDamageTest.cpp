@@ -8,6 +8,7 @@
 #include <regex>
 
 #include "QelModelBuilder.h"
+#include "QelModelLoader.h"
 #include "QelStepDataScan.h"
 #include "QelStepImportSupport.h"
 
@@ -150,9 +151,19 @@ TEST(QelStepDamageTest, WhatTheTranslatorDoesNotReadIsListedWithItsEntities) {
   for (const std::string& note : notes) said = said || note == path + ": not read: 1 datums";
   EXPECT_TRUE(said);
   // The list travels with the model through its JSON form.
-  const nlohmann::json model = Dump(root.get());
+  nlohmann::json model = Dump(root.get());
   ASSERT_TRUE(model.contains("notRead"));
-  EXPECT_EQ(model["notRead"].size(), missing.size());
+  QelBaseUnknown_var loaded;
+  std::string error;
+  ASSERT_EQ(QelModelLoader::LoadText(model.dump(), "m.json", loaded, error), S_OK) << error;
+  const std::vector<QelModelNotRead> back = QelModelBuilder::NotRead(loaded.get());
+  ASSERT_EQ(back.size(), missing.size());
+  EXPECT_EQ(back[0].kind, missing[0].kind);
+  EXPECT_EQ(back[0].entities, missing[0].entities);
+  // A count below the entities it lists is refused where it stands.
+  model["notRead"][0]["count"] = 0;
+  EXPECT_EQ(QelModelLoader::LoadText(model.dump(), "m.json", loaded, error), E_FAIL);
+  EXPECT_EQ(error, "m.json: $.notRead[0].count: expected at least 1 and at least the number of entities");
 }
 
 TEST(QelStepDamageTest, PristineFilesListWhatTheTranslatorSkips) {
