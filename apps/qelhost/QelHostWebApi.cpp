@@ -18,6 +18,7 @@
 #include "QelILumSet.h"
 #include "QelIVIABaseUI.h"
 #include "QelListValQelUnicodeString.h"
+#include "QelModelBuilder.h"
 #include "QelModelObject.h"
 #include "QelModelPrinter.h"
 #include "QelPLMProductOccurrence.h"
@@ -268,6 +269,10 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
   body += ",\"filters\":" + Dump(filters);
   body += ",\"notDrawn\":" + Dump(json{{"count", listed}, {"listed", notDrawn}});
   body += ",\"unplaced\":" + Dump(unplaced_);
+  json notRead = json::array();
+  for (const QelModelNotRead& missing : QelModelBuilder::NotRead(session_.Root()))
+    notRead.push_back({{"kind", missing.kind}, {"count", missing.count}, {"entities", missing.entities}});
+  body += ",\"notRead\":" + Dump(notRead);
   body += ",\"products\":" + ProductsJson() + "}";
   return reply;
 }

@@ -22,6 +22,7 @@
 #include "QelITPSType.h"
 #include "QelITPSTypeClassifier.h"
 #include "QelITPSView.h"
+#include "QelModelBuilder.h"
 #include "QelRovFacetServices.h"
 
 namespace {
@@ -187,6 +188,14 @@ void Walk(QelBaseUnknown* root, std::ostream& out, std::function<void(QelBaseUnk
   QelLumInstantiateComponentBase(59, component);
   printer.naming = QelVar<QelILumNamingComponent>(component.get());
   QelRovFacetServices::ListAllSets(root, printer.allSets, false);
+  // What the source file held and the model lacks comes first: a reviewer must not take
+  // the tree below for the whole file.
+  for (const QelModelNotRead& missing : QelModelBuilder::NotRead(root)) {
+    std::string text = "not read: " + std::to_string(missing.count) + " " + missing.kind;
+    for (size_t i = 0; i < missing.entities.size(); ++i) text += (i ? ", " : " (") + missing.entities[i];
+    if (!missing.entities.empty()) text += missing.entities.size() < missing.count ? ", ...)" : ")";
+    printer.Line(0, text);
+  }
   printer.Product(root, 0);
 }
 }  // namespace

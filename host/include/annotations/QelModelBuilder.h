@@ -27,6 +27,14 @@ enum class QelRootSetScope { None, Direct, ARM };
 // Text and dimension visualisation objects are annotations that type filters leave out.
 enum class QelAnnotationVisu { None, Text, Dimension };
 
+// What the model's source file holds and was not read, of one kind: how many, and the
+// file's names for them (STEP entity numbers), so a reviewer knows the model is partial.
+struct QelModelNotRead {
+  std::string kind{};
+  size_t count = 0;
+  std::vector<std::string> entities{};
+};
+
 struct QelModelProductDesc {
   std::string alias{};
   std::string icon = "I_Product";
@@ -141,6 +149,10 @@ class QelModelBuilder {
 
   // The name reports use for the model (file name for loaded models).
   void SetSourceName(const std::string& name);
+  // What the source file held and the model lacks; read back with NotRead.
+  void SetNotRead(std::vector<QelModelNotRead> notRead);
+  // The list of the model of any of its objects; empty for a complete model.
+  static std::vector<QelModelNotRead> NotRead(QelBaseUnknown* object);
 
  private:
   struct State;

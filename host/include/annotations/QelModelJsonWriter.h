@@ -12,8 +12,9 @@ class QelModelJsonWriter {
  public:
   QelModelJsonWriter() = delete;
 
-  // False when `root` is not the root product of a model.
-  static bool Write(QelBaseUnknown* root, std::ostream& out);
+  // False when `root` is not the root product of a model. Not `indented`: all on one
+  // line, half the bytes, for a model handed from process to process rather than read.
+  static bool Write(QelBaseUnknown* root, std::ostream& out, bool indented = true);
   // Writes through a temporary file beside `path` and renames it into place, so a failed
   // write leaves what was there. False with `error` ("<path>: ...").
   static bool WriteFile(QelBaseUnknown* root, const std::string& path, std::string& error);

@@ -22,6 +22,7 @@
     expand: (row) => `Expand ${row}`,
     collapse: (row) => `Collapse ${row}`,
     noPanel: 'No panel is open.',
+    notRead: (what) => `Not read from the file: ${what}`,
     noItems: 'No views or captures to browse.',
     noPreview: 'No preview',
     notShown: 'Only captures of sets loaded light can be shown',
@@ -152,6 +153,7 @@
     const unplaced = state.unplaced || [];
     const named = unplaced.length > 6 ? words.more(unplaced.slice(0, 6).join(', '), unplaced.length - 6) : unplaced.join(', ');
     setText($('unplaced'), unplaced.length ? words.unplaced(unplaced.length, named) : '');
+    drawNotRead(state.notRead);
     view.serial += 1;
     document.body.dataset.serial = String(view.serial);
     if (state.question) ask(state.question);
@@ -240,6 +242,26 @@
   // for the page's layout and for a screen reader's live region.
   function setText(node, text) {
     if (node.textContent !== text) node.textContent = text;
+  }
+
+  // What the model's file held and was not read stays in sight above the panes, so that
+  // nobody takes the panel for the whole file.
+  function drawNotRead(notRead) {
+    const text = (notRead || []).map((n) => {
+      const ids = n.entities && n.entities.length
+        ? ` (${n.entities.join(', ')}${n.entities.length < n.count ? ', …' : ''})` : '';
+      return `${n.count} ${n.kind}${ids}`;
+    }).join('; ');
+    let box = $('not-read');
+    if (!box && !text) return;
+    if (!box) {
+      box = document.createElement('p');
+      box.id = 'not-read';
+      box.className = 'status error';
+      $('status').after(box);
+    }
+    setText(box, text ? words.notRead(text) : '');
+    box.hidden = !text;
   }
 
   function drawDisplay(display, changes) {

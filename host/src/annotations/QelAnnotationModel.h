@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "QelBaseUnknown_WR.h"
+#include "QelModelBuilder.h"
 
 class QelLumAnnotationSet;
 class QelPLMProductOccurrence;
@@ -29,6 +30,8 @@ class QelAnnotationModel : public QelBaseUnknown {
   bool IsDisplayWatched() const { return displayWatched_; }
   void WatchDisplay() { displayWatched_ = true; }
   void SetSourceName(std::string name) { sourceName_ = std::move(name); }
+  const std::vector<QelModelNotRead>& NotRead() const { return notRead_; }
+  void SetNotRead(std::vector<QelModelNotRead> notRead) { notRead_ = std::move(notRead); }
 
  protected:
   ~QelAnnotationModel() override;
@@ -37,5 +40,6 @@ class QelAnnotationModel : public QelBaseUnknown {
   QelBaseUnknown_WR root_;
   std::vector<QelVar<QelLumAnnotationSet>> sets_;
   std::string sourceName_;
+  std::vector<QelModelNotRead> notRead_;
   bool displayWatched_ = false;
 };

@@ -42,6 +42,15 @@ void QelModelBuilder::SetSourceName(const std::string& name) {
   if (state_->model) state_->model->SetSourceName(name);
 }
 
+void QelModelBuilder::SetNotRead(std::vector<QelModelNotRead> notRead) {
+  if (state_->model) state_->model->SetNotRead(std::move(notRead));
+}
+
+std::vector<QelModelNotRead> QelModelBuilder::NotRead(QelBaseUnknown* object) {
+  QelAnnotationModel* model = QelAnnotationModel::Of(object);
+  return model ? model->NotRead() : std::vector<QelModelNotRead>{};
+}
+
 QelBaseUnknown_var QelModelBuilder::AddProduct(const QelBaseUnknown_var& parent, const QelModelProductDesc& desc) {
   if (!state_->model) return nullptr;
   auto* father = state_->Mine<QelPLMProductOccurrence>(parent.get());

@@ -1,6 +1,8 @@
 #include "QelModelJsonWriter.h"
 
+#include <charconv>
 #include <cstdio>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <unordered_map>
@@ -18,6 +20,15 @@
 #include "QelPLMRepReference.h"
 
 namespace {
+// A vertex is a float: the shortest decimal that reads back to it, rather than the 17
+// digits of the double it widens to, halves a mesh's text and the time to write and read it.
+double ShortFloat(float value) {
+  char text[32];
+  const auto end = std::to_chars(text, text + sizeof text - 1, value).ptr;
+  *end = '\0';
+  return std::strtod(text, nullptr);
+}
+
 using Json = nlohmann::ordered_json;
 
 Json Vec(const QelMathVector& v) { return Json::array({v.x, v.y, v.z}); }
@@ -40,7 +51,8 @@ class Writer {
     }
     if (const auto& shape = p->Shape(); shape && !shape->triangles.empty()) {
       Json vertices = Json::array(), faces = Json::array();
-      for (const auto& v : shape->vertices) vertices.push_back(Json::array({v[0], v[1], v[2]}));
+      for (const auto& v : shape->vertices)
+        vertices.push_back(Json::array({ShortFloat(v[0]), ShortFloat(v[1]), ShortFloat(v[2])}));
       for (const auto& t : shape->triangles) faces.push_back(Json::array({t[0], t[1], t[2]}));
       j["shape"] = {{"triangles", {{"vertices", std::move(vertices)}, {"faces", std::move(faces)}}}};
     }
@@ -191,7 +203,7 @@ class Writer {
 };
 }  // namespace
 
-bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out) {
+bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out, bool indented) {
   QelAnnotationModel* model = QelAnnotationModel::Of(root);
   if (!model || !model->Root() || !root || model->Root()->GetImpl() != root->GetImpl()) return false;
   Writer writer;
@@ -203,7 +215,16 @@ bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out) {
   Json sets = Json::array();
   for (const auto& s : model->Sets()) sets.push_back(writer.Set(s.get()));
   doc["sets"] = std::move(sets);
-  out << doc.dump(1) << '\n';
+  if (!model->NotRead().empty()) {
+    Json notRead = Json::array();
+    for (const QelModelNotRead& n : model->NotRead()) {
+      Json item = {{"kind", n.kind}, {"count", n.count}};
+      if (!n.entities.empty()) item["entities"] = n.entities;
+      notRead.push_back(std::move(item));
+    }
+    doc["notRead"] = std::move(notRead);
+  }
+  out << doc.dump(indented ? 1 : -1) << '\n';
   return static_cast<bool>(out);
 }
 

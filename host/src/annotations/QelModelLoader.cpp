@@ -166,7 +166,7 @@ class Loader {
 
   void Load(const Json& doc) {
     Where top;
-    CheckKeys(doc, top, {"format", "version", "root", "sets"});
+    CheckKeys(doc, top, {"format", "version", "root", "sets", "notRead"});
     if (String(Require(doc, "format", top), top.Key("format")) != "qel-product-model") {
       throw Refused(top.Key("format"), "expected \"qel-product-model\"");
     }
@@ -179,6 +179,7 @@ class Loader {
       throw Refused(rootAt.Key("placement"), "the root product has no father to be placed in");
     }
     Product(root, rootAt, builder_.Root().get());
+    if (auto notRead = doc.find("notRead"); notRead != doc.end()) NotRead(*notRead, top.Key("notRead"));
     auto it = doc.find("sets");
     if (it == doc.end()) return;
     Where setsAt = top.Key("sets");
@@ -187,6 +188,27 @@ class Loader {
   }
 
  private:
+  void NotRead(const Json& list, const Where& where) {
+    std::vector<QelModelNotRead> out;
+    for (size_t i = 0; i < Array(list, where).size(); ++i) {
+      const Where at = where.At(static_cast<int>(i));
+      const Json& item = Object(list[i], at);
+      CheckKeys(item, at, {"kind", "count", "entities"});
+      QelModelNotRead entry{.kind = String(Require(item, "kind", at), at.Key("kind"))};
+      if (auto ids = item.find("entities"); ids != item.end()) {
+        for (size_t k = 0; k < Array(*ids, at.Key("entities")).size(); ++k)
+          entry.entities.push_back(String((*ids)[k], at.Key("entities").At(static_cast<int>(k))));
+      }
+      const int64_t count = Integer(Require(item, "count", at), at.Key("count"));
+      if (count < 1 || static_cast<uint64_t>(count) < entry.entities.size()) {
+        throw Refused(at.Key("count"), "expected at least 1 and at least the number of entities");
+      }
+      entry.count = static_cast<size_t>(count);
+      out.push_back(std::move(entry));
+    }
+    builder_.SetNotRead(std::move(out));
+  }
+
   enum class Kind { Product, Rep, Set, Annotation, View, Capture };
   // One per identifier of the file, so kept small: the set of a set's member, to check
   // references that must stay within one set.
