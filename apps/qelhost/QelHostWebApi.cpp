@@ -9,6 +9,7 @@
 #include "QelDelayedDestruction.h"
 #include "QelFrmEditor.h"
 #include "QelHostPanel.h"
+#include "QelAnnotationLabel.h"
 #include "QelHostSession.h"
 #include "QelIAlias.h"
 #include "QelIDbrBrowserViewBaseUI.h"
@@ -203,6 +204,7 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
   body += ",\"changes\":" + Dump(json{{"shown", changes.shown}, {"hidden", changes.hidden}});
   body += ",\"display\":" + Dump(json{{"shown", shown}, {"hidden", hidden}});
   body += ",\"picture\":\"/api/picture.png?v=" + std::to_string(version_) + "\"";
+  body += ",\"unit\":" + Dump(json(QelAnnotationLabel::LengthUnit(session_.Root())));
   body += ",\"question\":" + Dump(question) + "}";
   return reply;
 }

@@ -14,6 +14,7 @@
   const words = {
     notDone: (reason) => `Not done: ${reason}`,
     counts: (shown, hidden) => `${shown} shown · ${hidden} hidden`,
+    unit: (unit) => ` · lengths in ${unit}`,
     more: (names, rest) => `${names} and ${rest} more`,
     hidden: (names) => `Hidden: ${names}`,
     shown: (names) => `Shown: ${names}`,
@@ -113,7 +114,7 @@
     setText($('status'), '');
     if (!keepPanel) drawPanel(state.panel);
     drawBrowser(state.browser);
-    drawDisplay(state.display, state.changes);
+    drawDisplay(state.display, state.changes, state.unit);
     view.serial += 1;
     document.body.dataset.serial = String(view.serial);
     if (state.question) ask(state.question);
@@ -125,8 +126,8 @@
     if (node.textContent !== text) node.textContent = text;
   }
 
-  function drawDisplay(display, changes) {
-    setText($('display-summary'), display ? words.counts(display.shown, display.hidden) : '');
+  function drawDisplay(display, changes, unit) {
+    setText($('display-summary'), display ? words.counts(display.shown, display.hidden) + (unit ? words.unit(unit) : '') : '');
     const parts = [];
     const list = (names) => (names.length > 6
       ? words.more(names.slice(0, 6).join(', '), names.length - 6) : names.join(', '));

@@ -29,6 +29,8 @@ class QelAnnotationModel : public QelBaseUnknown {
   bool IsDisplayWatched() const { return displayWatched_; }
   void WatchDisplay() { displayWatched_ = true; }
   void SetSourceName(std::string name) { sourceName_ = std::move(name); }
+  const std::string& LengthUnit() const { return lengthUnit_; }
+  void SetLengthUnit(std::string unit) { lengthUnit_ = std::move(unit); }
 
  protected:
   ~QelAnnotationModel() override;
@@ -37,5 +39,6 @@ class QelAnnotationModel : public QelBaseUnknown {
   QelBaseUnknown_WR root_;
   std::vector<QelVar<QelLumAnnotationSet>> sets_;
   std::string sourceName_;
+  std::string lengthUnit_;
   bool displayWatched_ = false;
 };

@@ -42,6 +42,10 @@ void QelModelBuilder::SetSourceName(const std::string& name) {
   if (state_->model) state_->model->SetSourceName(name);
 }
 
+void QelModelBuilder::SetLengthUnit(const std::string& unit) {
+  if (state_->model) state_->model->SetLengthUnit(unit);
+}
+
 QelBaseUnknown_var QelModelBuilder::AddProduct(const QelBaseUnknown_var& parent, const QelModelProductDesc& desc) {
   if (!state_->model) return nullptr;
   auto* father = state_->Mine<QelPLMProductOccurrence>(parent.get());

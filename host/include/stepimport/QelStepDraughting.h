@@ -1,0 +1,43 @@
+#pragma once
+// QelStepDraughting: what a STEP file says about the presentation of its annotations, read
+// from the file's text where the translator gives it wrongly or not at all: each saved
+// view's camera (where it stands, whether it clips) and the annotations it shows, each
+// annotation's drawn lines placed in its annotation plane, and the file's length unit.
+// Annotations are named by keys the PMI reader can form from the translated document:
+// "T:<tolerance name>", "A:<datum letter>", "D:<n>" for the n-th dimension of the file.
+// A plain value, made once per import from the whole text.
+#include <optional>
+#include <string>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+#include "QelModelBuilder.h"
+
+class QelStepDraughting {
+ public:
+  struct Camera {
+    QelMathPoint eye{};      // where the camera stands, in the model
+    QelMathVector axis{};    // its placement's axis
+    bool frontClipping = false, backClipping = false;
+    double frontDistance = 0.0, backDistance = 0.0;  // along the line of sight from the eye
+    std::vector<std::string> shows{};  // keys of the annotations its view lists, in file order
+  };
+
+  static QelStepDraughting Scan(std::string_view text);
+
+  // The camera of the saved view of that name (the camera's or the view's own), or null.
+  const Camera* FindCamera(const std::string& viewName) const;
+  // The lines an annotation is drawn with, in the model; empty when the file draws none.
+  const std::vector<QelModelSegment>& Drawing(const std::string& key) const;
+  // The names of the file's dimensions in file order: "D:<n>" is the n-th (from 0).
+  const std::vector<std::string>& DimensionNames() const { return dimensionNames_; }
+  // "mm", "cm", "m", "in" or "ft": the unit of the file's lengths; empty when not found.
+  const std::string& LengthUnit() const { return lengthUnit_; }
+
+ private:
+  std::unordered_map<std::string, Camera> cameras_;
+  std::unordered_map<std::string, std::vector<QelModelSegment>> drawings_;
+  std::vector<std::string> dimensionNames_;
+  std::string lengthUnit_;
+};
