@@ -1,7 +1,7 @@
 // What the importer reads of a file's presentation from its text: where each saved view's
 // camera stands (its projection point is in the camera's own placement) and whether it
 // clips, which annotations each view lists however its callouts are linked, each
-// annotation's drawn lines placed by its annotation plane, and the file's length unit.
+// annotation's drawn lines placed by its annotation plane, and the unit of each dimension.
 #include <gtest/gtest.h>
 
 #include "QelStepDraughting.h"
@@ -46,7 +46,11 @@ const char* kFile =
     "#63=CARTESIAN_POINT('',(5.,5.,5.));\n"
     "#64=DIRECTION('',(0.,0.,1.));\n"
     "#65=DIRECTION('',(0.,1.,0.));\n"
-    "#70=(LENGTH_UNIT() NAMED_UNIT(*) SI_UNIT(.MILLI.,.METRE.));\n"
+    "#70=(CONVERSION_BASED_UNIT('INCH',#71) LENGTH_UNIT() NAMED_UNIT(#72));\n"
+    "#73=DIMENSIONAL_CHARACTERISTIC_REPRESENTATION(#23,#74);\n"
+    "#74=SHAPE_DIMENSION_REPRESENTATION('',(#75),#99);\n"
+    "#75=(LENGTH_MEASURE_WITH_UNIT() MEASURE_REPRESENTATION_ITEM() MEASURE_WITH_UNIT(LENGTH_MEASURE(0.5),#70) "
+    "REPRESENTATION_ITEM('nominal value'));\n"
     "ENDSEC;\n";
 
 void ExpectNear(const QelMathPoint& a, const QelMathPoint& b) { EXPECT_LT((a - b).Norm(), 1e-9) << a.x << " " << a.y << " " << a.z; }
@@ -61,12 +65,13 @@ TEST(QelStepDraughtingTest, CameraStandsAtItsPlacementAndClipsOnlyWhereAsked) {
   EXPECT_FALSE(camera->frontClipping);
   EXPECT_TRUE(camera->backClipping);
   EXPECT_EQ(file.FindCamera("V2"), nullptr);
-  EXPECT_EQ(file.LengthUnit(), "mm");
 }
 
 TEST(QelStepDraughtingTest, ViewListsItsCalloutsAnnotationsHoweverTheyAreLinked) {
   const QelStepDraughting file = QelStepDraughting::Scan(kFile);
   EXPECT_EQ(file.DimensionNames(), (std::vector<std::string>{"diameter", "diameter"}));
+  EXPECT_EQ(file.DimensionScale(0), 1.0) << "no value of its own";
+  EXPECT_EQ(file.DimensionScale(1), 25.4) << "its value is in inches";
   // The dimension is the first of its name; the datum's callout names only a shape aspect
   // on the datum feature's face.
   EXPECT_EQ(file.FindCamera("V1")->shows, (std::vector<std::string>{"T:Flatness.1", "D:0", "A:A"}));
@@ -91,6 +96,6 @@ TEST(QelStepDraughtingTest, DamagedPresentationEntitiesAreLeftOutWithoutHarm) {
   text += "#200=TESSELLATED_CURVE_SET('',#201,((1,7,99,-3)));\n#201=COORDINATES_LIST('',1,((1.,2.)));\n";
   const QelStepDraughting file = QelStepDraughting::Scan(text);
   EXPECT_TRUE(file.Drawing("D:0").empty());
-  EXPECT_EQ(QelStepDraughting::Scan("").LengthUnit(), "");
+  EXPECT_EQ(QelStepDraughting::Scan("").DimensionScale(0), 1.0);
   EXPECT_EQ(QelStepDraughting::Scan("DATA;#1=CAMERA_MODEL_D3('X',#1,#1);#2=('").FindCamera("Y"), nullptr);
 }

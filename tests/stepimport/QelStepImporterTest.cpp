@@ -159,6 +159,13 @@ TEST(QelStepImporterTest, Ftc06HasThreeViewsEachCapturedWithTheFilesCamera) {
     EXPECT_EQ(capture["view"], (*view)["id"]);
     ExpectDirection(Vec(capture["camera"]["target"]) - Vec(capture["camera"]["origin"]), directions.at(name), name);
   }
+  // An inch file: nominals and deviations alike in millimetres, the model's unit
+  // (the file says R 0.5 +/- 0.02 in).
+  EXPECT_EQ(model["unit"], "mm");
+  const Json* radius = ByAlias(set["annotations"], "radius 12.7");
+  ASSERT_TRUE(radius) << "the nominal is named in millimetres";
+  EXPECT_NEAR((*radius)["dimension"]["nominal"].get<double>(), 12.7, 1e-6);
+  EXPECT_NEAR((*radius)["dimension"]["upper"].get<double>(), 0.508, 1e-6);
   // The translator gives these views no annotations: the file's views list them (MBD_A's
   // 26 callouts less one tolerance the translator does not give by its file name).
   const std::map<std::string, size_t> shows = {{"MBD_A", 25}, {"MBD_B", 11}, {"MBD_C", 18}};

@@ -2,9 +2,10 @@
 // QelStepDraughting: what a STEP file says about the presentation of its annotations, read
 // from the file's text where the translator gives it wrongly or not at all: each saved
 // view's camera (where it stands, whether it clips) and the annotations it shows, each
-// annotation's drawn lines placed in its annotation plane, and the file's length unit.
+// annotation's drawn lines placed in its annotation plane.
 // Annotations are named by keys the PMI reader can form from the translated document:
-// "T:<tolerance name>", "A:<datum letter>", "D:<n>" for the n-th dimension of the file.
+// "T:<tolerance name>", "A:<datum letter>", "D:<n>" for the n-th dimension of the file,
+// whose value's unit is read too.
 // A plain value, made once per import from the whole text.
 #include <optional>
 #include <string>
@@ -32,12 +33,13 @@ class QelStepDraughting {
   const std::vector<QelModelSegment>& Drawing(const std::string& key) const;
   // The names of the file's dimensions in file order: "D:<n>" is the n-th (from 0).
   const std::vector<std::string>& DimensionNames() const { return dimensionNames_; }
-  // "mm", "cm", "m", "in" or "ft": the unit of the file's lengths; empty when not found.
-  const std::string& LengthUnit() const { return lengthUnit_; }
+  // Millimetres per unit of the n-th dimension's value as the file writes it (25.4 for
+  // inches): the translator gives nominal values in the file's unit.
+  double DimensionScale(size_t n) const;
 
  private:
   std::unordered_map<std::string, Camera> cameras_;
   std::unordered_map<std::string, std::vector<QelModelSegment>> drawings_;
   std::vector<std::string> dimensionNames_;
-  std::string lengthUnit_;
+  std::vector<double> dimensionScales_;
 };

@@ -230,6 +230,18 @@ std::optional<std::string> ToleranceName(std::string_view s) {
   return Str(p[0]);
 }
 
+std::string UnitName(std::string_view s);
+
+// Millimetres per unit of a length unit's name; 0 for one not known.
+double Millimetres(const std::string& unit) {
+  if (unit == "mm") return 1.0;
+  if (unit == "cm") return 10.0;
+  if (unit == "m") return 1000.0;
+  if (unit == "in") return 25.4;
+  if (unit == "ft") return 304.8;
+  return 0.0;
+}
+
 class Resolver {
  public:
   explicit Resolver(const Scanner& scan) : scan_(scan) {
@@ -252,6 +264,7 @@ class Resolver {
       }
       dimensionIndex_.emplace(id, names.size());
       names.push_back(name);
+      scales.push_back(Scale(id));
     }
   }
 
@@ -292,8 +305,31 @@ class Resolver {
   }
 
   std::vector<std::string> names;
+  std::vector<double> scales;
 
  private:
+  // Millimetres per unit of a dimension's length value (its characteristic representation's
+  // first length measure); 1 when it has none or its unit is not known.
+  double Scale(long dimension) const {
+    for (long r : scan_.Referrers(dimension)) {
+      auto dcr = Record(scan_.At(r), "DIMENSIONAL_CHARACTERISTIC_REPRESENTATION");
+      if (!dcr) continue;
+      const auto p = Split(*dcr);
+      if (p.size() < 2 || Ref(p[0]) != dimension) continue;
+      const auto sdr = Split(scan_.Args(Ref(p[1]), "SHAPE_DIMENSION_REPRESENTATION").value_or(std::string_view()));
+      if (sdr.size() < 2) continue;
+      for (std::string_view item : List(sdr[1])) {
+        auto measure = scan_.Args(Ref(item), "MEASURE_WITH_UNIT");
+        if (!measure || measure->find("LENGTH_MEASURE") == npos) continue;
+        const auto m = Split(*measure);
+        if (m.size() < 2) continue;
+        const double scale = Millimetres(UnitName(scan_.At(Ref(m[1]))));
+        return scale > 0.0 ? scale : 1.0;
+      }
+    }
+    return 1.0;
+  }
+
   std::string Direct(long id, std::string_view s) const {
     if (IsDimension(s)) {
       auto it = dimensionIndex_.find(id);
@@ -442,6 +478,7 @@ QelStepDraughting QelStepDraughting::Scan(std::string_view text) {
   const Scanner scan(text);
   const Resolver resolver(scan);
   out.dimensionNames_ = resolver.names;
+  out.dimensionScales_ = resolver.scales;
 
   // Which callout an annotation occurrence belongs to, the plane each callout lies in,
   // and the annotation each callout presents (its draughting model item associations).
@@ -459,8 +496,6 @@ QelStepDraughting QelStepDraughting::Scan(std::string_view text) {
       const auto p = Split(*plane);
       if (p.size() >= 4)
         for (std::string_view item : List(p[3])) planeOf.emplace(Ref(item), Ref(p[2]));
-    } else if (out.lengthUnit_.empty() && Record(s, "LENGTH_UNIT")) {
-      out.lengthUnit_ = UnitName(s);
     }
   }
   for (long id : scan.Order()) {
@@ -566,6 +601,10 @@ QelStepDraughting QelStepDraughting::Scan(std::string_view text) {
     if (!name.empty() && name != camera && !out.cameras_.count(name)) out.cameras_[name] = view;
   }
   return out;
+}
+
+double QelStepDraughting::DimensionScale(size_t n) const {
+  return n < dimensionScales_.size() ? dimensionScales_[n] : 1.0;
 }
 
 const QelStepDraughting::Camera* QelStepDraughting::FindCamera(const std::string& viewName) const {

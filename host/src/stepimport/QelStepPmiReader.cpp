@@ -343,8 +343,14 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     // The n-th dimension of this name is the n-th of that name in the file.
     size_t index = dimensionSeen[name]++, at = 0;
     std::string key;
+    // The translator gives nominal values and limits in the file's unit, deviations and
+    // shapes in millimetres: the model's unit.
+    double scale = 1.0;
     for (size_t i = 0; i < draughting.DimensionNames().size() && key.empty(); ++i)
-      if (draughting.DimensionNames()[i] == name && at++ == index) key = "D:" + std::to_string(i);
+      if (draughting.DimensionNames()[i] == name && at++ == index) {
+        key = "D:" + std::to_string(i);
+        scale = draughting.DimensionScale(i);
+      }
     Pending p{label, {}, OwnerOf(label), {}, key};
     const XCAFDimTolObjects_DimensionType type = object->GetType();
     if (type == XCAFDimTolObjects_DimensionType_CommonLabel ||
@@ -361,7 +367,7 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
       p.desc.typeName = "Dimension";
       p.desc.subTypeName = sub;
       p.desc.typeCode = 6;
-      const double value = object->GetValue();
+      const double value = object->GetValue() * scale;
       p.desc.alias = (name.empty() ? sub : name) + (value != 0.0 ? " " + Number(value) : std::string());
       QelModelDimensionValue said{.nominal = value};
       // The translator gives the lower deviation as its size below the nominal value.
@@ -370,9 +376,9 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
         said.upper = object->GetUpperTolValue();
         said.lower = -object->GetLowerTolValue();
       } else if (object->IsDimWithRange()) {
-        p.desc.tolerance = object->GetUpperBound() - object->GetLowerBound();
-        said.upper = object->GetUpperBound();
-        said.lower = object->GetLowerBound();
+        p.desc.tolerance = (object->GetUpperBound() - object->GetLowerBound()) * scale;
+        said.upper = object->GetUpperBound() * scale;
+        said.lower = object->GetLowerBound() * scale;
         said.limits = true;
       }
       // A dimension the file gives no value (the translator's 0) says no number.
