@@ -177,7 +177,7 @@ TEST(QelStepImporterTest, Ftc06HasThreeViewsEachCapturedWithTheFilesCamera) {
   }
 }
 
-TEST(QelStepImporterTest, Stc06OpensWithItsAnnotationsAndNoView) {
+TEST(QelStepImporterTest, Stc06OpensWithItsAnnotationsAndTheFilesOwnViews) {
   QEL_REQUIRE_NIST_MODELS();
   QelBaseUnknown_var root = Import(kStc06);
   ASSERT_TRUE(root);
@@ -185,7 +185,20 @@ TEST(QelStepImporterTest, Stc06OpensWithItsAnnotationsAndNoView) {
   ASSERT_EQ(model["sets"].size(), 1u);
   const Json& set = model["sets"][0];
   EXPECT_EQ(set["rootSet"], "direct") << "the file's single part is the root, whose set is its own";
-  EXPECT_TRUE(set["views"].empty());
+  // The translator reads none of this file's twelve saved views: the file's cameras and
+  // draughting models give them, each with what it shows.
+  ASSERT_EQ(set["views"].size(), 12u);
+  ASSERT_EQ(set["captures"].size(), 12u);
+  const std::map<std::string, size_t> shows = {{"MBD_A", 21}, {"MBD_B", 11}, {"MBD_C", 8}, {"Front", 0}};
+  for (const auto& [name, count] : shows) {
+    const Json* view = ByAlias(set["views"], name);
+    ASSERT_TRUE(view) << name;
+    EXPECT_EQ((*view)["elements"].size(), count) << name;
+    EXPECT_TRUE((*view)["plane"].is_null()) << name;
+  }
+  const Json* front = ByAlias(set["captures"], "Front Capture");
+  ASSERT_TRUE(front);
+  ExpectDirection(Vec((*front)["camera"]["target"]) - Vec((*front)["camera"]["origin"]), {0, 1, 0}, "front looks along +y");
   EXPECT_EQ(WithCode(set, 3).size(), 6u) << "datums A to F";
   EXPECT_GT(WithCode(set, 5).size(), 20u);
   EXPECT_GT(Triangles(model["root"]), 1000u);

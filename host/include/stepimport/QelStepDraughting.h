@@ -19,7 +19,9 @@ class QelStepDraughting {
  public:
   struct Camera {
     QelMathPoint eye{};      // where the camera stands, in the model
-    QelMathVector axis{};    // its placement's axis
+    QelMathVector axis{};    // its placement's axis: the line of sight
+    QelMathVector up{};      // its placement's second axis
+    bool parallel = true;
     bool frontClipping = false, backClipping = false;
     double frontDistance = 0.0, backDistance = 0.0;  // along the line of sight from the eye
     std::vector<std::string> shows{};  // keys of the annotations its view lists, in file order
@@ -29,6 +31,8 @@ class QelStepDraughting {
 
   // The camera of the saved view of that name (the camera's or the view's own), or null.
   const Camera* FindCamera(const std::string& viewName) const;
+  // The names of the file's saved views (their cameras'), in file order.
+  const std::vector<std::string>& ViewNames() const { return viewNames_; }
   // The lines an annotation is drawn with, in the model; empty when the file draws none.
   const std::vector<QelModelSegment>& Drawing(const std::string& key) const;
   // The names of the file's dimensions in file order: "D:<n>" is the n-th (from 0).
@@ -39,6 +43,7 @@ class QelStepDraughting {
 
  private:
   std::unordered_map<std::string, Camera> cameras_;
+  std::vector<std::string> viewNames_;
   std::unordered_map<std::string, std::vector<QelModelSegment>> drawings_;
   std::vector<std::string> dimensionNames_;
   std::vector<double> dimensionScales_;

@@ -547,10 +547,12 @@ QelStepDraughting QelStepDraughting::Scan(std::string_view text) {
     Camera camera;
     const Place place = scan.Placement(Ref(p[1]));
     camera.axis = place.z;
+    camera.up = place.y;
     camera.eye = place.origin;
     if (auto volume = scan.Args(Ref(p[2]), "VIEW_VOLUME")) {
       const auto v = Split(*volume);
       if (v.size() >= 7) {
+        camera.parallel = Upper(std::string(v[0])) != ".CENTRAL.";
         const auto projection = scan.Triple(Ref(v[1]), "CARTESIAN_POINT");
         // The projection point is given in the camera's own placement.
         if (projection.size() == 3) camera.eye = place.Apply({projection[0], projection[1], projection[2]});
@@ -578,6 +580,8 @@ QelStepDraughting QelStepDraughting::Scan(std::string_view text) {
     for (std::string_view item : items)
       if (auto it = cameraName.find(Ref(item)); it != cameraName.end()) camera = it->second;
     if (camera.empty()) continue;
+    if (std::find(out.viewNames_.begin(), out.viewNames_.end(), camera) == out.viewNames_.end())
+      out.viewNames_.push_back(camera);
     Camera& view = out.cameras_[camera];
     std::unordered_set<std::string> seen(view.shows.begin(), view.shows.end());
     auto show = [&](long callout) {

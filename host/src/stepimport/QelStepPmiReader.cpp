@@ -433,6 +433,17 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     if (!p.fileKey.empty()) byKey.emplace(p.fileKey, Made{made, owner});
   }
 
+  // The saved views as the translator gives them, corrected by the file's cameras; the
+  // file's own when the translator gives none.
+  struct Saved {
+    std::string name;
+    QelMathPoint eye;
+    QelMathVector sight, up;
+    bool parallel, front, back;
+    double frontAt, backAt;
+    std::vector<const Made*> shown;
+  };
+  std::vector<Saved> saved;
   Handle(XCAFDoc_ViewTool) views = XCAFDoc_DocumentTool::ViewTool(document_->Main());
   labels.Clear();
   views->GetViewLabels(labels);
@@ -441,27 +452,52 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     if (!label.FindAttribute(XCAFDoc_View::GetID(), view)) continue;
     Handle(XCAFView_Object) object = view->GetObject();
     if (object.IsNull()) continue;
+    const std::string name = Text(object->Name());
+    const QelStepDraughting::Camera* camera = draughting.FindCamera(name);
+    // The translator gives the projection point as the file does, in the camera's own
+    // placement; the file's camera says where that is in the model.
+    Saved v{name,
+            camera ? camera->eye : Point(object->ProjectionPoint()),
+            Vector(object->ViewDirection()),
+            Vector(object->UpDirection()),
+            object->Type() == XCAFView_ProjectionType_Parallel,
+            camera ? camera->frontClipping : static_cast<bool>(object->HasFrontPlaneClipping()),
+            camera ? camera->backClipping : static_cast<bool>(object->HasBackPlaneClipping()),
+            camera ? camera->frontDistance : object->FrontPlaneDistance(),
+            camera ? camera->backDistance : object->BackPlaneDistance(),
+            {}};
     TDF_LabelSequence refs;
     views->GetRefGDTLabel(label, refs);
-    std::string name = Text(object->Name());
-    const QelStepDraughting::Camera* camera = draughting.FindCamera(name);
-    std::vector<const Made*> shown;
     for (const TDF_Label& ref : refs)
-      if (auto it = byLabel.find(Entry(ref)); it != byLabel.end()) shown.push_back(&it->second);
+      if (auto it = byLabel.find(Entry(ref)); it != byLabel.end()) v.shown.push_back(&it->second);
     // The translator leaves some views empty: what the file's view lists stands instead.
-    if (shown.empty() && camera)
+    if (v.shown.empty() && camera)
       for (const std::string& key : camera->shows)
-        if (auto it = byKey.find(key); it != byKey.end()) shown.push_back(&it->second);
+        if (auto it = byKey.find(key); it != byKey.end()) v.shown.push_back(&it->second);
+    saved.push_back(std::move(v));
+  }
+  if (saved.empty()) {
+    for (const std::string& name : draughting.ViewNames()) {
+      const QelStepDraughting::Camera* camera = draughting.FindCamera(name);
+      Saved v{name,           camera->eye,           camera->axis,          camera->up, camera->parallel,
+              camera->frontClipping, camera->backClipping, camera->frontDistance, camera->backDistance, {}};
+      for (const std::string& key : camera->shows)
+        if (auto it = byKey.find(key); it != byKey.end()) v.shown.push_back(&it->second);
+      saved.push_back(std::move(v));
+    }
+  }
+
+  for (Saved& v : saved) {
     // The view joins the set holding most of its annotations; the others cannot be its elements.
     std::map<std::string, size_t> bySet;
-    for (const Made* made : shown) ++bySet[made->owner];
+    for (const Made* made : v.shown) ++bySet[made->owner];
     std::string owner = main;
     size_t best = 0;
     for (const auto& [candidate, count] : bySet)
       if (count > best) std::tie(owner, best) = std::make_pair(candidate, count);
     std::vector<QelBaseUnknown*> elements;
     size_t elsewhere = 0;
-    for (const Made* made : shown) {
+    for (const Made* made : v.shown) {
       if (made->owner != owner) {
         ++elsewhere;
         continue;
@@ -469,16 +505,13 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
       QelBaseUnknown* element = made->annotation.get();
       if (std::find(elements.begin(), elements.end(), element) == elements.end()) elements.push_back(element);
     }
-    if (name.empty()) name = "View." + std::to_string(viewCount_ + 1);
+    std::string name = v.name.empty() ? "View." + std::to_string(viewCount_ + 1) : v.name;
     if (elsewhere > 0) {
       notes.push_back("view '" + name + "': " + std::to_string(elsewhere) +
                       " annotations of other products are not among its elements");
     }
-    // The translator gives the projection point as the file does, in the camera's own
-    // placement; the file's camera says where that is in the model.
-    const QelMathPoint eye = camera ? camera->eye : Point(object->ProjectionPoint());
-    const QelMathVector sight = Vector(object->ViewDirection());
-    const QelMathVector up = Vector(object->UpDirection());
+    const QelMathVector& sight = v.sight;
+    const QelMathVector& up = v.up;
     QelMathVector right = sight.Cross(up);
     const double rightLength = right.Norm();
     if (rightLength > 0.0) right = right * (1.0 / rightLength);
@@ -486,14 +519,10 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     // front plane faces the camera and cuts what lies before it, the back one what lies
     // beyond. With both, the front one is kept: a view clips along one plane here.
     std::optional<QelMathPlane> plane;
-    const bool front = camera ? camera->frontClipping : object->HasFrontPlaneClipping();
-    const bool back = camera ? camera->backClipping : object->HasBackPlaneClipping();
-    if (front) {
-      const double at = camera ? camera->frontDistance : object->FrontPlaneDistance();
-      plane = QelMathPlane(eye + sight * at, -sight, right, up);
-    } else if (back) {
-      const double at = camera ? camera->backDistance : object->BackPlaneDistance();
-      plane = QelMathPlane(eye + sight * at, sight, -right, up);
+    if (v.front) {
+      plane = QelMathPlane(v.eye + sight * v.frontAt, -sight, right, up);
+    } else if (v.back) {
+      plane = QelMathPlane(v.eye + sight * v.backAt, sight, -right, up);
     }
     QelModelViewDesc viewDesc{.alias = name, .plane = plane, .elements = elements};
     QelBaseUnknown_var set = SetFor(owner);
@@ -503,9 +532,9 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     // such a camera looks at the scene's centre from twice the scene's size, so that a
     // perspective viewer (30-degree field) sees the whole part in the middle.
     const double reach = sceneSize > 0.0 ? 2.0 * sceneSize : 1.0;
-    QelMathPoint from = eye;
-    QelMathPoint to = eye + sight * std::max((sceneCentre - eye).Dot(sight), reach);
-    if (object->Type() == XCAFView_ProjectionType_Parallel) {
+    QelMathPoint from = v.eye;
+    QelMathPoint to = v.eye + sight * std::max((sceneCentre - v.eye).Dot(sight), reach);
+    if (v.parallel) {
       from = sceneCentre - sight * reach;
       to = sceneCentre;
     }
