@@ -137,7 +137,7 @@ struct Printer {
     if (isDefault) text += ", default";
     if (QelVar<QelITPSTextVisu>(annotation)) text += ", text display";
     if (QelVar<QelITPSDimVisu>(annotation)) text += ", dimension display";
-    if (const std::string label = QelAnnotationLabel::Text(annotation); !label.empty() && label != AliasOf(annotation))
+    if (const std::string label = QelAnnotationLabel::Text(annotation); !label.empty())
       text += ", reads \"" + label + "\"";
     Line(depth, text);
   }

@@ -5,7 +5,7 @@
 
 std::string QelAnnotationLabel::Text(QelBaseUnknown* annotation) {
   const QelLumAnnotation* a = QelLumAnnotation::From(annotation);
-  return a ? a->Label() : std::string();
+  return a && (a->Frame() || a->Dimension()) ? a->Label() : std::string();
 }
 
 std::string QelAnnotationLabel::LengthUnit(QelBaseUnknown* modelObject) {
