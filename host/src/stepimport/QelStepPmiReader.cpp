@@ -414,7 +414,9 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     QelBaseUnknown_var annotation;
     std::string owner;
   };
-  std::unordered_map<std::string, Made> byKey;
+  // The file names a callout's annotation by a key two annotations may share (the rows of
+  // a composite frame carry one name): a view showing the key shows both.
+  std::unordered_map<std::string, std::vector<Made>> byKey;
   std::unordered_map<std::string, Made> byLabel;
   std::map<std::pair<std::string, std::string>, QelBaseUnknown_var> datums;  // (owner, letter)
   for (Pending& p : pending) {
@@ -430,7 +432,11 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
       if (!p.datumKey.empty()) datums.emplace(std::make_pair(owner, p.datumKey), made);
     }
     byLabel.emplace(Entry(p.label), Made{made, owner});
-    if (!p.fileKey.empty()) byKey.emplace(p.fileKey, Made{made, owner});
+    if (!p.fileKey.empty()) {
+      std::vector<Made>& same = byKey[p.fileKey];
+      if (std::none_of(same.begin(), same.end(), [&](const Made& m) { return m.annotation->IsEqual(made.get()); }))
+        same.push_back(Made{made, owner});
+    }
   }
 
   // The saved views as the translator gives them, corrected by the file's cameras; the
@@ -473,7 +479,8 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     // The translator leaves some views empty: what the file's view lists stands instead.
     if (v.shown.empty() && camera)
       for (const std::string& key : camera->shows)
-        if (auto it = byKey.find(key); it != byKey.end()) v.shown.push_back(&it->second);
+        if (auto it = byKey.find(key); it != byKey.end())
+          for (const Made& made : it->second) v.shown.push_back(&made);
     saved.push_back(std::move(v));
   }
   if (saved.empty()) {
@@ -482,7 +489,8 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
       Saved v{name,           camera->eye,           camera->axis,          camera->up, camera->parallel,
               camera->frontClipping, camera->backClipping, camera->frontDistance, camera->backDistance, {}};
       for (const std::string& key : camera->shows)
-        if (auto it = byKey.find(key); it != byKey.end()) v.shown.push_back(&it->second);
+        if (auto it = byKey.find(key); it != byKey.end())
+          for (const Made& made : it->second) v.shown.push_back(&made);
       saved.push_back(std::move(v));
     }
   }
