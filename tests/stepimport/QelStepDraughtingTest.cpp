@@ -72,6 +72,8 @@ TEST(QelStepDraughtingTest, ViewListsItsCalloutsAnnotationsHoweverTheyAreLinked)
   EXPECT_EQ(file.DimensionNames(), (std::vector<std::string>{"diameter", "diameter"}));
   EXPECT_EQ(file.DimensionScale(0), 1.0) << "no value of its own";
   EXPECT_EQ(file.DimensionScale(1), 25.4) << "its value is in inches";
+  EXPECT_EQ(file.DimensionNominal(1), 0.5) << "as the file writes it";
+  EXPECT_FALSE(file.DimensionNominal(0));
   // The dimension is the first of its name; the datum's callout names only a shape aspect
   // on the datum feature's face.
   EXPECT_EQ(file.FindCamera("V1")->shows, (std::vector<std::string>{"T:Flatness.1", "D:0", "A:A"}));

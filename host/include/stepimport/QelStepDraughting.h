@@ -40,6 +40,8 @@ class QelStepDraughting {
   // Millimetres per unit of the n-th dimension's value as the file writes it (25.4 for
   // inches): the translator gives nominal values in the file's unit.
   double DimensionScale(size_t n) const;
+  // The n-th dimension's nominal value as the file writes it, if it gives one.
+  std::optional<double> DimensionNominal(size_t n) const;
 
  private:
   std::unordered_map<std::string, Camera> cameras_;
@@ -47,4 +49,5 @@ class QelStepDraughting {
   std::unordered_map<std::string, std::vector<QelModelSegment>> drawings_;
   std::vector<std::string> dimensionNames_;
   std::vector<double> dimensionScales_;
+  std::vector<std::optional<double>> dimensionNominals_;
 };

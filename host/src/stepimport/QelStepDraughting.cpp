@@ -265,6 +265,7 @@ class Resolver {
       dimensionIndex_.emplace(id, names.size());
       names.push_back(name);
       scales.push_back(Scale(id));
+      nominals.push_back(Nominal(id));
     }
   }
 
@@ -306,11 +307,22 @@ class Resolver {
 
   std::vector<std::string> names;
   std::vector<double> scales;
+  std::vector<std::optional<double>> nominals;
 
  private:
   // Millimetres per unit of a dimension's length value (its characteristic representation's
   // first length measure); 1 when it has none or its unit is not known.
   double Scale(long dimension) const {
+    double scale = 1.0;
+    Measure(dimension, &scale);
+    return scale;
+  }
+
+  // The nominal value of a dimension as the file writes it (its characteristic
+  // representation's item named 'nominal value', else its first measure), if any.
+  std::optional<double> Nominal(long dimension) const { return Measure(dimension, nullptr); }
+
+  std::optional<double> Measure(long dimension, double* scale) const {
     for (long r : scan_.Referrers(dimension)) {
       auto dcr = Record(scan_.At(r), "DIMENSIONAL_CHARACTERISTIC_REPRESENTATION");
       if (!dcr) continue;
@@ -318,16 +330,26 @@ class Resolver {
       if (p.size() < 2 || Ref(p[0]) != dimension) continue;
       const auto sdr = Split(scan_.Args(Ref(p[1]), "SHAPE_DIMENSION_REPRESENTATION").value_or(std::string_view()));
       if (sdr.size() < 2) continue;
+      std::optional<double> first;
       for (std::string_view item : List(sdr[1])) {
         auto measure = scan_.Args(Ref(item), "MEASURE_WITH_UNIT");
-        if (!measure || measure->find("LENGTH_MEASURE") == npos) continue;
+        if (!measure) continue;
         const auto m = Split(*measure);
-        if (m.size() < 2) continue;
-        const double scale = Millimetres(UnitName(scan_.At(Ref(m[1]))));
-        return scale > 0.0 ? scale : 1.0;
+        const size_t open = m.empty() ? npos : m[0].find('(');
+        if (m.size() < 2 || open == npos) continue;
+        const double value = Num(m[0].substr(open + 1));
+        if (scale && m[0].find("LENGTH_MEASURE") != npos) {
+          const double mm = Millimetres(UnitName(scan_.At(Ref(m[1]))));
+          *scale = mm > 0.0 ? mm : 1.0;
+          return value;
+        }
+        const auto named = Split(scan_.Args(Ref(item), "REPRESENTATION_ITEM").value_or(std::string_view()));
+        if (!named.empty() && Str(named[0]) == "nominal value") return value;
+        if (!first) first = value;
       }
+      if (!scale) return first;
     }
-    return 1.0;
+    return std::nullopt;
   }
 
   std::string Direct(long id, std::string_view s) const {
@@ -479,6 +501,7 @@ QelStepDraughting QelStepDraughting::Scan(std::string_view text) {
   const Resolver resolver(scan);
   out.dimensionNames_ = resolver.names;
   out.dimensionScales_ = resolver.scales;
+  out.dimensionNominals_ = resolver.nominals;
 
   // Which callout an annotation occurrence belongs to, the plane each callout lies in,
   // and the annotation each callout presents (its draughting model item associations).
@@ -605,6 +628,10 @@ QelStepDraughting QelStepDraughting::Scan(std::string_view text) {
     if (!name.empty() && name != camera && !out.cameras_.count(name)) out.cameras_[name] = view;
   }
   return out;
+}
+
+std::optional<double> QelStepDraughting::DimensionNominal(size_t n) const {
+  return n < dimensionNominals_.size() ? dimensionNominals_[n] : std::nullopt;
 }
 
 double QelStepDraughting::DimensionScale(size_t n) const {

@@ -4,6 +4,7 @@
 #include <cctype>
 #include <cmath>
 #include <map>
+#include <set>
 #include <tuple>
 
 #include <BRepBndLib.hxx>
@@ -276,6 +277,7 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
   std::vector<Pending> pending;
   const QelStepDraughting draughting = QelStepDraughting::Scan(fileText_);
   std::map<std::string, size_t> dimensionSeen;
+  std::set<size_t> taken;  // the file's dimensions matched already
   // The label's place: from the translator's drawing, else the file's own drawing of it.
   auto Place = [&](Pending& p, const auto& object, bool hasText, const gp_Pnt& text, std::vector<QelModelSegment> drawn) {
     if (drawn.empty() && !p.fileKey.empty()) drawn = draughting.Drawing(p.fileKey);
@@ -340,17 +342,28 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     Handle(XCAFDimTolObjects_DimensionObject) object = dimension->GetObject();
     if (object.IsNull()) continue;
     const std::string name = Text(object->GetSemanticName());
-    // The n-th dimension of this name is the n-th of that name in the file.
-    size_t index = dimensionSeen[name]++, at = 0;
+    // The file's dimension of this name and nominal value not taken yet, else the n-th of
+    // this name: files name many dimensions alike ("diameter").
+    const double given = object->GetValue();
+    const std::vector<std::string>& names = draughting.DimensionNames();
+    std::optional<size_t> match;
+    for (size_t i = 0; i < names.size() && !match; ++i) {
+      const std::optional<double> nominal = draughting.DimensionNominal(i);
+      if (names[i] == name && !taken.count(i) && nominal && std::abs(*nominal - given) <= 1e-9 * std::max(1.0, std::abs(given)))
+        match = i;
+    }
+    for (size_t i = 0, at = 0, index = dimensionSeen[name]; i < names.size() && !match; ++i)
+      if (names[i] == name && at++ == index && !taken.count(i)) match = i;
+    ++dimensionSeen[name];
     std::string key;
     // The translator gives nominal values and limits in the file's unit, deviations and
     // shapes in millimetres: the model's unit.
     double scale = 1.0;
-    for (size_t i = 0; i < draughting.DimensionNames().size() && key.empty(); ++i)
-      if (draughting.DimensionNames()[i] == name && at++ == index) {
-        key = "D:" + std::to_string(i);
-        scale = draughting.DimensionScale(i);
-      }
+    if (match) {
+      taken.insert(*match);
+      key = "D:" + std::to_string(*match);
+      scale = draughting.DimensionScale(*match);
+    }
     Pending p{label, {}, OwnerOf(label), {}, key};
     const XCAFDimTolObjects_DimensionType type = object->GetType();
     if (type == XCAFDimTolObjects_DimensionType_CommonLabel ||
