@@ -10,6 +10,7 @@
 #include "QelFrmEditor.h"
 #include "QelHostDisplayReasons.h"
 #include "QelHostPanel.h"
+#include "QelAnnotationLabel.h"
 #include "QelHostSession.h"
 #include "QelIAlias.h"
 #include "QelIDbrBrowserViewBaseUI.h"
@@ -273,6 +274,7 @@ QelHostWebReply QelHostWebApi::StateWith(const Changes& changes) {
   for (const QelModelNotRead& missing : QelModelBuilder::NotRead(session_.Root()))
     notRead.push_back({{"kind", missing.kind}, {"count", missing.count}, {"entities", missing.entities}});
   body += ",\"notRead\":" + Dump(notRead);
+  body += ",\"unit\":" + Dump(json(QelAnnotationLabel::LengthUnit(session_.Root())));
   body += ",\"products\":" + ProductsJson() + "}";
   return reply;
 }

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "QelAnnotationComponents.h"
+#include "QelAnnotationLabel.h"
 #include "QelIAlias.h"
 #include "QelILumCapture.h"
 #include "QelILumCollection.h"
@@ -59,6 +60,8 @@ struct Printer {
     bool light = false;
     if (QelVar<QelILumLightLoadModeObservable> observable{product}) observable->IsLightLoadMode(light);
     if (light) text += " light-load mode";
+    if (depth == 0)
+      if (const std::string unit = QelAnnotationLabel::LengthUnit(product); !unit.empty()) text += ", lengths in " + unit;
     QelMathTransformation placement;
     if (QelVar<QelIPLMNavOccurrence> occurrence{product};
         occurrence && occurrence->GetPlacement(placement) == S_OK && !placement.IsIdentity()) {
@@ -135,6 +138,8 @@ struct Printer {
     if (isDefault) text += ", default";
     if (QelVar<QelITPSTextVisu>(annotation)) text += ", text display";
     if (QelVar<QelITPSDimVisu>(annotation)) text += ", dimension display";
+    if (const std::string label = QelAnnotationLabel::Text(annotation); !label.empty())
+      text += ", reads \"" + label + "\"";
     Line(depth, text);
   }
 

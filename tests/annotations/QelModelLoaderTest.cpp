@@ -100,6 +100,16 @@ TEST(QelModelLoaderTest, RefusesEachClassOfBadContentNamingTheJsonPath) {
       {Model(kGoodAnnotation, R"(, {"id": "s2", "owner": "p1", "annotations": [{"id": "b1", "type": "T",
            "subType": "S", "code": 3}, {"id": "b2", "type": "T", "subType": "S", "code": 0}]})"),
        "bad.json: $.sets[1].annotations[1].code: unknown type code 0 (known codes are 1 to 13)"},
+      {Model(R"({"id": "a1", "type": "T", "subType": "Position", "code": 5, "frame": {"zone": 1, "material": "X"}})"),
+       "bad.json: $.sets[0].annotations[0].frame.material: expected \"M\" or \"L\""},
+      {Model(R"({"id": "a1", "type": "T", "subType": "Position", "code": 5, "frame": {"datums": ["A"]}})"),
+       "bad.json: $.sets[0].annotations[0].frame: missing key 'zone'"},
+      {Model(R"({"id": "a1", "type": "T", "subType": "S", "code": 6, "dimension": {"nominal": 2, "upper": 1, "min": 1}})"),
+       "bad.json: $.sets[0].annotations[0].dimension: give deviations (upper, lower) or limits (min, max), not both"},
+      {Model(R"({"id": "a1", "type": "T", "subType": "S", "code": 6, "dimension": {"nominal": 2, "lower": [1]}})"),
+       "bad.json: $.sets[0].annotations[0].dimension.lower: expected a number, found array"},
+      {R"({"format": "qel-product-model", "version": 1, "unit": 25.4, "root": {"id": "r"}})",
+       "bad.json: $.unit: expected a string, found number"},
   };
   for (const Case& c : cases) EXPECT_EQ(Refusal(c.text), c.expected);
 }

@@ -149,6 +149,26 @@ TEST(QelRasterizerTest, GoldenPictures) {
   ExpectLooksLike(*large, "003-annotation.png");
 }
 
+// A tolerance frame reads as the drawing's: a square box with its characteristic symbol
+// drawn in lines (the font lacks most), then one box per compartment; the material
+// condition, a circled letter the font lacks, reads "(M)".
+TEST(QelRasterizerTest, ToleranceFramesDrawTheirSymbolsAndCompartments) {
+  QelTextRenderer text;
+  if (!text.IsReady()) GTEST_SKIP() << text.Error();
+  QelRenderScene scene;
+  const char* symbols[] = {"\u2316", "\u27C2", "\u2313", "\u232D", "\u2330", "\u232F", "\u23E5", "\u2225"};
+  for (int i = 0; i < 8; ++i) {
+    QelRenderAnnotation a{{(i % 2) * 4.4 - 4.4, 1.8 - (i / 2) * 1.5, 0}, {}, {0.85f, 0.1f, 0.1f}, "frame"};
+    a.compartments = {symbols[i], i == 0 ? "\u23000.75 \u24C2" : "0.2", "A", "B-C"};
+    scene.annotations.push_back(a);
+  }
+  QelRenderView view = LookDownZ(10);
+  view.text = &text;
+  auto image = QelMakeVar<QelPixelImage>(300, 170);
+  QelRasterizer::Render(scene, view, *image);
+  ExpectLooksLike(*image, "004-tolerance-frames.png");
+}
+
 // Annotations without a drawing of their own often share an anchor; each label must stay
 // readable, and a crowd of them must not make the picture slow to place.
 TEST(QelRasterizerTest, LabelsSharingAnAnchorMoveAsideInsteadOfCovering) {

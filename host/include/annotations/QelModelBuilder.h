@@ -68,6 +68,24 @@ struct QelModelSegment {
   QelMathPoint to{};
 };
 
+// A geometric tolerance's feature control frame: the zone's size and shape, the material
+// condition it applies at, and the datums it refers to in order of precedence.
+struct QelModelToleranceFrame {
+  double zone = 0.0;
+  std::string zoneShape{};            // "", "diameter" or "spherical diameter"
+  std::string material{};             // "", "M" (maximum) or "L" (least material condition)
+  std::vector<std::string> datums{};  // "A", "B", ... as the frame's compartments read
+};
+
+// A dimension's nominal value and its tolerance: deviations from the nominal (the lower
+// one usually negative) or the two limits.
+struct QelModelDimensionValue {
+  double nominal = 0.0;
+  std::optional<double> upper{};
+  std::optional<double> lower{};
+  bool limits = false;  // upper and lower are limits rather than deviations
+};
+
 struct QelModelAnnotationDesc {
   std::string alias{};
   std::vector<std::string> navigationNames{};
@@ -83,6 +101,10 @@ struct QelModelAnnotationDesc {
   bool shown = true;
   QelMathPoint anchor{};
   std::vector<QelModelSegment> segments{};
+  // The point of the annotated geometry a leader runs to from the anchor, if known.
+  std::optional<QelMathPoint> leader{};
+  std::optional<QelModelToleranceFrame> frame{};
+  std::optional<QelModelDimensionValue> dimension{};
 };
 
 struct QelModelViewDesc {
@@ -153,6 +175,9 @@ class QelModelBuilder {
   void SetNotRead(std::vector<QelModelNotRead> notRead);
   // The list of the model of any of its objects; empty for a complete model.
   static std::vector<QelModelNotRead> NotRead(QelBaseUnknown* object);
+  // The length unit every coordinate and value of the model is in ("mm", "in"...); empty
+  // when the model does not say.
+  void SetLengthUnit(const std::string& unit);
 
  private:
   struct State;

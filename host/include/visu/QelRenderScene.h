@@ -27,6 +27,9 @@ struct QelRenderAnnotation {
   std::vector<QelMathPoint> segments{};  // pairs: from, to
   QelRenderColor color{};
   std::string text{};
+  // A tolerance frame's compartments (characteristic symbol first), drawn as boxes side
+  // by side instead of `text`; empty for a label of one box.
+  std::vector<std::string> compartments{};
 };
 
 struct QelRenderScene {

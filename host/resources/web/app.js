@@ -16,6 +16,7 @@
   const words = {
     notDone: (reason) => `Not done: ${reason}`,
     counts: (shown, hidden) => `${shown} shown · ${hidden} hidden`,
+    unit: (unit) => ` · lengths in ${unit}`,
     more: (names, rest) => `${names} and ${rest} more`,
     hidden: (names) => `Hidden: ${names}`,
     shown: (names) => `Shown: ${names}`,
@@ -149,7 +150,7 @@
     drawNotDrawn(state.notDrawn, keepPanel);
     drawProducts(state.products);
     drawBrowser(state.browser);
-    drawDisplay(state.display, state.changes);
+    drawDisplay(state.display, state.changes, state.unit);
     const unplaced = state.unplaced || [];
     const named = unplaced.length > 6 ? words.more(unplaced.slice(0, 6).join(', '), unplaced.length - 6) : unplaced.join(', ');
     setText($('unplaced'), unplaced.length ? words.unplaced(unplaced.length, named) : '');
@@ -264,8 +265,8 @@
     box.hidden = !text;
   }
 
-  function drawDisplay(display, changes) {
-    setText($('display-summary'), display ? words.counts(display.shown, display.hidden) : '');
+  function drawDisplay(display, changes, unit) {
+    setText($('display-summary'), display ? words.counts(display.shown, display.hidden) + (unit ? words.unit(unit) : '') : '');
     const parts = [];
     const list = (names) => (names.length > 6
       ? words.more(names.slice(0, 6).join(', '), names.length - 6) : names.join(', '));

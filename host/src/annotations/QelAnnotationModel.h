@@ -32,6 +32,8 @@ class QelAnnotationModel : public QelBaseUnknown {
   void SetSourceName(std::string name) { sourceName_ = std::move(name); }
   const std::vector<QelModelNotRead>& NotRead() const { return notRead_; }
   void SetNotRead(std::vector<QelModelNotRead> notRead) { notRead_ = std::move(notRead); }
+  const std::string& LengthUnit() const { return lengthUnit_; }
+  void SetLengthUnit(std::string unit) { lengthUnit_ = std::move(unit); }
 
  protected:
   ~QelAnnotationModel() override;
@@ -41,5 +43,6 @@ class QelAnnotationModel : public QelBaseUnknown {
   std::vector<QelVar<QelLumAnnotationSet>> sets_;
   std::string sourceName_;
   std::vector<QelModelNotRead> notRead_;
+  std::string lengthUnit_;
   bool displayWatched_ = false;
 };

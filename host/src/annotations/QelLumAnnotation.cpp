@@ -1,5 +1,8 @@
 #include "QelLumAnnotation.h"
 
+#include <cmath>
+#include <cstdio>
+
 #include "QelLumAnnotationSet.h"
 #include "QelMetaObject.h"
 #include "QelRovFacetFilterData.h"
@@ -24,7 +27,10 @@ QelLumAnnotation::QelLumAnnotation(QelLumAnnotationSet* set, const QelModelAnnot
       isDefault_(desc.isDefault),
       visu_(desc.visu),
       anchor_(desc.anchor),
-      segments_(desc.segments) {}
+      segments_(desc.segments),
+      leader_(desc.leader),
+      frame_(desc.frame),
+      dimension_(desc.dimension) {}
 QelLumAnnotation::~QelLumAnnotation() = default;
 
 void* QelLumAnnotation::QueryDirect(const QelIID& iid) {
@@ -100,4 +106,78 @@ bool QelLumAnnotation::PassesFilter(const QelRovFacetFilterData& filter) const {
   if (filter.DefaultAnnot && !isDefault_) return false;
   if (filter.TolAnnot && (!tolerance_ || !filter.IsInToleranceRange(*tolerance_))) return false;
   return true;
+}
+
+namespace {
+std::string Number(double value) {
+  char text[32];
+  std::snprintf(text, sizeof text, "%g", std::abs(value) < 1e-12 ? 0.0 : value);
+  return text;
+}
+
+std::string Signed(double value) { return (value < 0.0 ? "-" : "+") + Number(std::abs(value)); }
+
+// The characteristic symbol of a tolerance, by the sub-type names the importer and model
+// files use; empty for one without a symbol of its own.
+std::string Symbol(const std::string& subType) {
+  static const std::pair<const char*, const char*> kSymbols[] = {
+      {"Position", "\u2316"},          {"Flatness", "\u23E5"},          {"Straightness", "\u23E4"},
+      {"Circularity", "\u25CB"},       {"Cylindricity", "\u232D"},      {"Profile of a Line", "\u2312"},
+      {"Profile of a Surface", "\u2313"}, {"Angularity", "\u2220"},     {"Perpendicularity", "\u27C2"},
+      {"Parallelism", "\u2225"},       {"Concentricity", "\u25CE"},     {"Coaxiality", "\u25CE"},
+      {"Symmetry", "\u232F"},          {"Circular Runout", "\u2197"},   {"Total Runout", "\u2330"}};
+  for (const auto& [name, symbol] : kSymbols)
+    if (subType == name) return symbol;
+  return {};
+}
+
+std::string SizePrefix(const std::string& subType) {
+  if (subType == "Diameter") return "\u2300";
+  if (subType == "Spherical Diameter") return "S\u2300";
+  if (subType == "Radius") return "R";
+  if (subType == "Spherical Radius") return "SR";
+  return {};
+}
+}  // namespace
+
+std::vector<std::string> QelLumAnnotation::Compartments() const {
+  if (frame_) {
+    std::vector<std::string> out;
+    const std::string symbol = Symbol(subTypeName_);
+    out.push_back(symbol.empty() ? subTypeName_ : symbol);
+    std::string zone = frame_->zoneShape == "diameter"            ? "\u2300"
+                       : frame_->zoneShape == "spherical diameter" ? "S\u2300"
+                                                                   : "";
+    zone += Number(frame_->zone);
+    if (frame_->material == "M") zone += " \u24C2";
+    if (frame_->material == "L") zone += " \u24C1";
+    out.push_back(zone);
+    for (const std::string& datum : frame_->datums) out.push_back(datum);
+    return out;
+  }
+  if (dimension_) {
+    const bool angle = subTypeName_ == "Angle";
+    const std::string unit = angle ? "\u00B0" : "";
+    std::string text = SizePrefix(subTypeName_);
+    const auto& d = *dimension_;
+    if (d.limits && d.upper && d.lower) {
+      text += Number(*d.upper) + unit + " / " + Number(*d.lower) + unit;
+    } else {
+      text += Number(d.nominal) + unit;
+      if (d.upper && d.lower && std::abs(*d.upper + *d.lower) < 1e-12 && *d.upper > 0.0) {
+        text += " \u00B1" + Number(*d.upper) + unit;
+      } else if (d.upper || d.lower) {
+        text += " " + Signed(d.upper.value_or(0.0)) + unit + " " + Signed(d.lower.value_or(0.0)) + unit;
+      }
+    }
+    return {text};
+  }
+  if (typeCode_ == 3 && !navigationNames_.empty() && !navigationNames_.front().empty()) return {navigationNames_.front()};
+  return {Alias()};
+}
+
+std::string QelLumAnnotation::Label() const {
+  std::string text;
+  for (const std::string& part : Compartments()) text += (text.empty() ? "" : " | ") + part;
+  return text;
 }

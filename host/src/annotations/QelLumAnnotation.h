@@ -62,6 +62,14 @@ class QelLumAnnotation : public QelModelObject,
   const std::optional<double>& Tolerance() const { return tolerance_; }
   bool IsDefault() const { return isDefault_; }
   const std::vector<std::string>& NavigationNames() const { return navigationNames_; }
+  const std::optional<QelMathPoint>& Leader() const { return leader_; }
+  const std::optional<QelModelToleranceFrame>& Frame() const { return frame_; }
+  const std::optional<QelModelDimensionValue>& Dimension() const { return dimension_; }
+  // What the annotation says, as one line a person reads: a tolerance frame's compartments
+  // ("⌖ | ⌀0.75 Ⓜ | A | B"), a dimension's nominal and tolerance, a datum's letter; the
+  // alias when it says nothing more. `Compartments` gives the same split at its bars.
+  std::string Label() const;
+  std::vector<std::string> Compartments() const;
 
  protected:
   ~QelLumAnnotation() override;
@@ -79,4 +87,7 @@ class QelLumAnnotation : public QelModelObject,
   QelAnnotationVisu visu_;
   QelMathPoint anchor_;
   std::vector<QelModelSegment> segments_;
+  std::optional<QelMathPoint> leader_;
+  std::optional<QelModelToleranceFrame> frame_;
+  std::optional<QelModelDimensionValue> dimension_;
 };

@@ -51,6 +51,10 @@ std::vector<QelModelNotRead> QelModelBuilder::NotRead(QelBaseUnknown* object) {
   return model ? model->NotRead() : std::vector<QelModelNotRead>{};
 }
 
+void QelModelBuilder::SetLengthUnit(const std::string& unit) {
+  if (state_->model) state_->model->SetLengthUnit(unit);
+}
+
 QelBaseUnknown_var QelModelBuilder::AddProduct(const QelBaseUnknown_var& parent, const QelModelProductDesc& desc) {
   if (!state_->model) return nullptr;
   auto* father = state_->Mine<QelPLMProductOccurrence>(parent.get());

@@ -152,6 +152,19 @@ class Writer {
       }
       j["segments"] = std::move(segments);
     }
+    if (a->Leader()) j["leader"] = Vec(*a->Leader());
+    if (const auto& f = a->Frame()) {
+      Json frame = {{"zone", f->zone}, {"datums", f->datums}};
+      if (!f->zoneShape.empty()) frame["zoneShape"] = f->zoneShape;
+      if (!f->material.empty()) frame["material"] = f->material;
+      j["frame"] = std::move(frame);
+    }
+    if (const auto& d = a->Dimension()) {
+      Json dimension = {{"nominal", d->nominal}};
+      if (d->upper) dimension[d->limits ? "max" : "upper"] = *d->upper;
+      if (d->lower) dimension[d->limits ? "min" : "lower"] = *d->lower;
+      j["dimension"] = std::move(dimension);
+    }
     return j;
   }
 
@@ -210,6 +223,7 @@ bool QelModelJsonWriter::Write(QelBaseUnknown* root, std::ostream& out, bool ind
   Json doc;
   doc["format"] = "qel-product-model";
   doc["version"] = 1;
+  if (!model->LengthUnit().empty()) doc["unit"] = model->LengthUnit();
   doc["root"] = writer.Product(model->Root(), true);
   writer.NameViews(model);
   Json sets = Json::array();

@@ -166,7 +166,8 @@ class Loader {
 
   void Load(const Json& doc) {
     Where top;
-    CheckKeys(doc, top, {"format", "version", "root", "sets", "notRead"});
+    CheckKeys(doc, top, {"format", "version", "unit", "root", "sets", "notRead"});
+    if (auto it = doc.find("unit"); it != doc.end()) builder_.SetLengthUnit(String(*it, top.Key("unit")));
     if (String(Require(doc, "format", top), top.Key("format")) != "qel-product-model") {
       throw Refused(top.Key("format"), "expected \"qel-product-model\"");
     }
@@ -340,7 +341,7 @@ class Loader {
 
   void Annotation(QelBaseUnknown* set, const Json& a, const Where& where) {
     CheckKeys(a, where, {"id", "alias", "names", "icon", "type", "subType", "code", "geometry", "visu", "tolerance",
-                         "default", "shown", "anchor", "segments"});
+                         "default", "shown", "anchor", "segments", "leader", "frame", "dimension"});
     QelModelAnnotationDesc desc;
     desc.alias = OptString(a, "alias", where, "");
     desc.icon = OptString(a, "icon", where, "I_Annotation");
@@ -378,6 +379,43 @@ class Loader {
         if (!segments[i].is_array() || segments[i].size() != 2) throw Refused(segAt, "expected [from, to]");
         desc.segments.push_back({Vector(segments[i][0], segAt.At(0)), Vector(segments[i][1], segAt.At(1))});
       }
+    }
+    if (auto it = a.find("leader"); it != a.end()) desc.leader = Vector(*it, where.Key("leader"));
+    if (auto it = a.find("frame"); it != a.end()) {
+      Where at = where.Key("frame");
+      const Json& f = Object(*it, at);
+      CheckKeys(f, at, {"zone", "zoneShape", "material", "datums"});
+      QelModelToleranceFrame frame;
+      frame.zone = Number(Require(f, "zone", at), at.Key("zone"));
+      frame.zoneShape = OptString(f, "zoneShape", at, "");
+      if (!frame.zoneShape.empty() && frame.zoneShape != "diameter" && frame.zoneShape != "spherical diameter") {
+        throw Refused(at.Key("zoneShape"), "expected \"diameter\" or \"spherical diameter\"");
+      }
+      frame.material = OptString(f, "material", at, "");
+      if (!frame.material.empty() && frame.material != "M" && frame.material != "L") {
+        throw Refused(at.Key("material"), "expected \"M\" or \"L\"");
+      }
+      if (auto d = f.find("datums"); d != f.end()) {
+        Where datumsAt = at.Key("datums");
+        const Json& datums = Array(*d, datumsAt);
+        for (size_t i = 0; i < datums.size(); ++i) frame.datums.push_back(String(datums[i], datumsAt.At(static_cast<int>(i))));
+      }
+      desc.frame = std::move(frame);
+    }
+    if (auto it = a.find("dimension"); it != a.end()) {
+      Where at = where.Key("dimension");
+      const Json& d = Object(*it, at);
+      CheckKeys(d, at, {"nominal", "upper", "lower", "min", "max"});
+      QelModelDimensionValue value;
+      value.nominal = Number(Require(d, "nominal", at), at.Key("nominal"));
+      const bool deviations = d.contains("upper") || d.contains("lower");
+      value.limits = d.contains("min") || d.contains("max");
+      if (deviations && value.limits) throw Refused(at, "give deviations (upper, lower) or limits (min, max), not both");
+      for (const char* key : {"upper", "max"})
+        if (auto u = d.find(key); u != d.end()) value.upper = Number(*u, at.Key(key));
+      for (const char* key : {"lower", "min"})
+        if (auto l = d.find(key); l != d.end()) value.lower = Number(*l, at.Key(key));
+      desc.dimension = value;
     }
     QelBaseUnknown_var made = builder_.AddAnnotation(QelBaseUnknown_var(set), desc);
     Declare(a, where, made.get(), Kind::Annotation, set);

@@ -81,8 +81,15 @@ void QelModelScene::CollectScene(QelRenderScene& scene, QelIVisuObjectFilter* fi
         mark.segments.push_back(toRoot.Apply(from));
         mark.segments.push_back(toRoot.Apply(to));
       }
+      // The leader to the annotated geometry is drawn like the annotation's own lines.
+      if (const auto& leader = annotation->Leader()) {
+        mark.segments.push_back(mark.anchor);
+        mark.segments.push_back(toRoot.Apply(*leader));
+      }
       mark.color = KindColor(annotation->TypeName());
-      mark.text = annotation->Alias();
+      mark.text = annotation->Label();
+      // A tolerance frame and a datum letter are drawn as boxes; other labels as one.
+      if (annotation->Frame()) mark.compartments = annotation->Compartments();
       scene.annotations.push_back(std::move(mark));
     }
   }

@@ -9,6 +9,7 @@
 #include <cstring>
 #include <sstream>
 #include <unordered_map>
+#include <unordered_set>
 
 #include <BRepBndLib.hxx>
 #include <Bnd_Box.hxx>
@@ -16,12 +17,17 @@
 #include <Message_Messenger.hxx>
 #include <Message_ProgressIndicator.hxx>
 #include <Message_ProgressScope.hxx>
+#include <Interface_InterfaceModel.hxx>
 #include <STEPCAFControl_Reader.hxx>
 #include <Standard_Failure.hxx>
 #include <TDF_LabelSequence.hxx>
 #include <TDF_Tool.hxx>
 #include <TDataStd_Name.hxx>
 #include <TDocStd_Document.hxx>
+#include <TransferBRep.hxx>
+#include <Transfer_TransientProcess.hxx>
+#include <XSControl_TransferReader.hxx>
+#include <XSControl_WorkSession.hxx>
 #include <XCAFApp_Application.hxx>
 #include <XCAFDoc_DocumentTool.hxx>
 #include <XCAFDoc_ShapeTool.hxx>
@@ -35,7 +41,6 @@
 #include "QelStepFileHeader.h"
 #include "QelStepPmiReader.h"
 #include "QelStepTessellator.h"
-#include "QelStepToleranceValues.h"
 
 namespace {
 // The loader's own bound on the depth of the product tree (docs/model-format.md).
@@ -93,19 +98,47 @@ QelMathTransformation Placement(const gp_Trsf& t) {
   return {column(1), column(2), column(3), column(4)};
 }
 
+// The shape labels that stand for a PRODUCT of the file (its product definitions), and how
+// many the file holds. The translator also makes an assembly of a product whose shape
+// representation is related to several representations (a solid and a wire body): its
+// components are no products, and the product's own shape may then have no label at all.
+struct FileProducts {
+  std::unordered_set<std::string> labels;
+  int count = 0;
+};
+
+FileProducts ProductLabels(STEPCAFControl_Reader& reader, const Handle(XCAFDoc_ShapeTool)& shapes) {
+  FileProducts out;
+  const Handle(XSControl_WorkSession) session = reader.ChangeReader().WS();
+  if (session.IsNull() || session->Model().IsNull() || session->TransferReader().IsNull()) return out;
+  const Handle(Transfer_TransientProcess) process = session->TransferReader()->TransientProcess();
+  const Handle(Interface_InterfaceModel) model = session->Model();
+  if (process.IsNull()) return out;
+  for (Standard_Integer i = 1; i <= model->NbEntities(); ++i) {
+    const Handle(Standard_Transient) entity = model->Value(i);
+    if (entity.IsNull() || !entity->IsKind("StepBasic_ProductDefinition")) continue;
+    ++out.count;
+    const TopoDS_Shape shape = TransferBRep::ShapeResult(process, entity);
+    TDF_Label label;
+    if (!shape.IsNull() && shapes->FindShape(shape, label)) out.labels.insert(Entry(label));
+  }
+  return out;
+}
+
 // Builds the product tree from the document's shape structure and collects, per part,
 // the products that show its shape.
 class ProductWalker {
  public:
-  explicit ProductWalker(QelModelBuilder& builder) : builder_(builder) {}
+  ProductWalker(QelModelBuilder& builder, FileProducts products) : builder_(builder), products_(std::move(products)) {}
 
   void Walk(const TDF_Label& prototype, const QelBaseUnknown_var& product, int depth) {
     const std::string entry = Entry(prototype);
     productOf.emplace(entry, product);
-    if (!XCAFDoc_ShapeTool::IsAssembly(prototype)) {
+    if (!XCAFDoc_ShapeTool::IsAssembly(prototype) || OneProduct(prototype)) {
       Part& part = parts[entry];
       part.label = prototype;
       part.products.push_back(product);
+      Gather(prototype, product, depth);
       return;
     }
     if (depth >= kMaxProductDepth) throw std::runtime_error("products nested more than 200 levels deep");
@@ -127,11 +160,37 @@ class ProductWalker {
     TDF_Label label;
     std::vector<QelBaseUnknown_var> products;
   };
+
+  // An assembly none of whose components is a product of the file is the pieces of one
+  // product's shape: that product shows them all and owns their annotations. A file of
+  // one product is one product whatever labels its shape got.
+  bool OneProduct(const TDF_Label& assembly) const {
+    if (products_.labels.empty() && products_.count != 1) return false;
+    TDF_LabelSequence components;
+    XCAFDoc_ShapeTool::GetComponents(assembly, components);
+    for (const TDF_Label& component : components) {
+      TDF_Label referred;
+      if (XCAFDoc_ShapeTool::GetReferredShape(component, referred) && products_.labels.count(Entry(referred))) return false;
+    }
+    return true;
+  }
+
+  void Gather(const TDF_Label& prototype, const QelBaseUnknown_var& product, int depth) {
+    if (depth >= kMaxProductDepth) throw std::runtime_error("products nested more than 200 levels deep");
+    TDF_LabelSequence components;
+    XCAFDoc_ShapeTool::GetComponents(prototype, components);
+    for (const TDF_Label& component : components) {
+      TDF_Label referred;
+      if (!XCAFDoc_ShapeTool::GetReferredShape(component, referred)) continue;
+      if (productOf.emplace(Entry(referred), product).second) Gather(referred, product, depth + 1);
+    }
+  }
   std::unordered_map<std::string, QelBaseUnknown_var> productOf;
   std::unordered_map<std::string, Part> parts;
 
  private:
   QelModelBuilder& builder_;
+  FileProducts products_;
   int unnamed_ = 0;
 };
 
@@ -267,7 +326,9 @@ QelBaseUnknown_var Translate(const std::string& path, const std::string& text, c
   if (rootAlias.empty()) rootAlias = std::filesystem::path(path).stem().string();
   QelModelBuilder builder({.alias = rootAlias});
   builder.SetSourceName(path);
-  ProductWalker walker(builder);
+  // The translator gives lengths in millimetres whatever the file's unit.
+  builder.SetLengthUnit("mm");
+  ProductWalker walker(builder, ProductLabels(reader, shapes));
   if (free.Length() == 1) {
     walker.Walk(free.First(), builder.Root(), 0);
   } else {
@@ -293,11 +354,7 @@ QelBaseUnknown_var Translate(const std::string& path, const std::string& text, c
 
   progress->Enter("annotations");
   if (annotated) {
-    std::unique_ptr<QelStepToleranceValues> values;
-    QelStepPmiReader pmi(closer.document, builder, walker.productOf, [&]() -> const QelStepToleranceValues& {
-      if (!values) values = std::make_unique<QelStepToleranceValues>(QelStepToleranceValues::Scan(text));
-      return *values;
-    });
+    QelStepPmiReader pmi(closer.document, builder, walker.productOf, text);
     QelMathPoint centre{};
     double size = 0.0;
     if (!scene.IsVoid()) {

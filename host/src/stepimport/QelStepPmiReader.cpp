@@ -4,9 +4,12 @@
 #include <cctype>
 #include <cmath>
 #include <map>
+#include <set>
 #include <tuple>
 
+#include <BRepBndLib.hxx>
 #include <BRep_Tool.hxx>
+#include <Bnd_Box.hxx>
 #include <Geom_Curve.hxx>
 #include <Geom_Line.hxx>
 #include <TCollection_HAsciiString.hxx>
@@ -22,6 +25,7 @@
 #include <XCAFDoc_DimTolTool.hxx>
 #include <XCAFDoc_Dimension.hxx>
 #include <XCAFDoc_DocumentTool.hxx>
+#include <XCAFDoc_ShapeTool.hxx>
 #include <XCAFDoc_GeomTolerance.hxx>
 #include <XCAFDoc_View.hxx>
 #include <XCAFDoc_ViewTool.hxx>
@@ -142,13 +146,55 @@ std::vector<QelModelSegment> Segments(const TopoDS_Shape& presentation) {
   return out;
 }
 
-// Where an annotation is drawn: its text, else its plane's origin, else its attachment point.
+// Where an annotation's label stands: where the file puts its text, else amid its drawing,
+// else at the geometry it annotates; an annotation plane's origin only when nothing else
+// is known, since files put many annotations' planes through one point.
 template <class Object>
-QelMathPoint Anchor(const Object& object, bool hasText, const gp_Pnt& text) {
+QelMathPoint Anchor(const Object& object, bool hasText, const gp_Pnt& text, const std::vector<QelModelSegment>& drawing,
+                    const std::optional<QelMathPoint>& geometry) {
   if (hasText) return Point(text);
+  if (!drawing.empty()) {
+    QelMathPoint low = drawing.front().from, high = low;
+    for (const QelModelSegment& s : drawing)
+      for (const QelMathPoint& p : {s.from, s.to}) {
+        low = {std::min(low.x, p.x), std::min(low.y, p.y), std::min(low.z, p.z)};
+        high = {std::max(high.x, p.x), std::max(high.y, p.y), std::max(high.z, p.z)};
+      }
+    return (low + high) * 0.5;
+  }
+  if (geometry) return *geometry;
   if (object->HasPlane()) return Point(object->GetPlane().Location());
   if (object->HasPoint()) return Point(object->GetPoint());
   return {};
+}
+
+// The datum letters of a tolerance's frame in order of precedence; the datums of one
+// compartment (a common datum) joined as "A-B".
+std::vector<std::string> DatumReferences(const Handle(XCAFDoc_DimTolTool)& tool, const TDF_Label& tolerance) {
+  TDF_LabelSequence datums;
+  tool->GetDatumWithObjectOfTolerLabels(tolerance, datums);
+  std::map<int, std::string> byPosition;
+  int unplaced = 1000;
+  for (const TDF_Label& label : datums) {
+    Handle(XCAFDoc_Datum) datum;
+    if (!label.FindAttribute(XCAFDoc_Datum::GetID(), datum)) continue;
+    Handle(XCAFDimTolObjects_DatumObject) object = datum->GetObject();
+    if (object.IsNull()) continue;
+    const std::string letter = Text(object->GetName());
+    if (letter.empty()) continue;
+    const int position = object->GetPosition() > 0 ? object->GetPosition() : unplaced++;
+    std::string& compartment = byPosition[position];
+    if (compartment.find(letter) == std::string::npos) compartment += (compartment.empty() ? "" : "-") + letter;
+  }
+  std::vector<std::string> out;
+  for (auto& [position, letters] : byPosition) out.push_back(std::move(letters));
+  return out;
+}
+
+// The leader runs from the label to the annotated geometry, when both are known and apart.
+std::optional<QelMathPoint> Leader(const QelMathPoint& anchor, const std::optional<QelMathPoint>& geometry) {
+  if (!geometry || (*geometry - anchor).Norm() < 1e-6) return std::nullopt;
+  return geometry;
 }
 }  // namespace
 
@@ -157,12 +203,34 @@ struct QelStepPmiReader::Pending {
   QelModelAnnotationDesc desc;
   std::string owner;     // entry of the owning prototype, "" when none is known
   std::string datumKey;  // datums repeat once per tolerance that cites them: one per letter
+  std::string fileKey;   // how the file's own presentation names it (QelStepDraughting)
 };
 
 QelStepPmiReader::QelStepPmiReader(const Handle(TDocStd_Document)& document, QelModelBuilder& builder,
                                    const std::unordered_map<std::string, QelBaseUnknown_var>& productOf,
-                                   std::function<const QelStepToleranceValues&()> toleranceValues)
-    : document_(document), builder_(builder), productOf_(productOf), toleranceValues_(std::move(toleranceValues)) {}
+                                   std::string_view fileText)
+    : document_(document), builder_(builder), productOf_(productOf), fileText_(fileText) {}
+
+const QelStepToleranceValues& QelStepPmiReader::ToleranceValues() {
+  if (!toleranceValues_) toleranceValues_ = QelStepToleranceValues::Scan(fileText_);
+  return *toleranceValues_;
+}
+
+std::optional<QelMathPoint> QelStepPmiReader::GeometryCentre(const TDF_Label& label) const {
+  Handle(XCAFDoc_DimTolTool) tool = XCAFDoc_DocumentTool::DimTolTool(document_->Main());
+  TDF_LabelSequence first, second;
+  tool->GetRefShapeLabel(label, first, second);
+  first.Append(second);
+  Bnd_Box box;
+  for (const TDF_Label& ref : first) {
+    const TopoDS_Shape shape = XCAFDoc_ShapeTool::GetShape(ref);
+    if (!shape.IsNull()) BRepBndLib::Add(shape, box, false);
+  }
+  if (box.IsVoid()) return std::nullopt;
+  double x0, y0, z0, x1, y1, z1;
+  box.Get(x0, y0, z0, x1, y1, z1);
+  return QelMathPoint{(x0 + x1) / 2, (y0 + y1) / 2, (z0 + z1) / 2};
+}
 
 // The prototype (part or assembly) whose shapes a GD&T label refers to: sub-shape labels
 // sit below their prototype, which sits directly below the shapes label.
@@ -177,7 +245,12 @@ std::string QelStepPmiReader::OwnerOf(const TDF_Label& label) const {
     while (!at.IsNull() && !at.IsRoot() && at.Father() != shapes) at = at.Father();
     if (at.IsNull() || at.IsRoot()) continue;
     const std::string entry = Entry(at);
-    if (productOf_.count(entry)) return entry;
+    auto it = productOf_.find(entry);
+    if (it == productOf_.end()) continue;
+    // Several labels may show one product (the pieces of its shape): one owner for them all,
+    // and "" for the root, as for annotations that name no shape.
+    if (it->second->IsEqual(builder_.Root().get())) return {};
+    return ownerKey_.emplace(it->second->GetImpl(), entry).first->second;
   }
   return {};
 }
@@ -202,6 +275,17 @@ QelBaseUnknown_var QelStepPmiReader::SetFor(const std::string& owner) {
 void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, std::vector<std::string>& notes) {
   Handle(XCAFDoc_DimTolTool) tool = XCAFDoc_DocumentTool::DimTolTool(document_->Main());
   std::vector<Pending> pending;
+  const QelStepDraughting draughting = QelStepDraughting::Scan(fileText_);
+  std::map<std::string, size_t> dimensionSeen;
+  std::set<size_t> taken;  // the file's dimensions matched already
+  // The label's place: from the translator's drawing, else the file's own drawing of it.
+  auto Place = [&](Pending& p, const auto& object, bool hasText, const gp_Pnt& text, std::vector<QelModelSegment> drawn) {
+    if (drawn.empty() && !p.fileKey.empty()) drawn = draughting.Drawing(p.fileKey);
+    const std::optional<QelMathPoint> geometry = GeometryCentre(p.label);
+    p.desc.anchor = Anchor(object, hasText, text, drawn, geometry);
+    p.desc.leader = Leader(p.desc.anchor, geometry);
+    p.desc.segments = std::move(drawn);
+  };
 
   TDF_LabelSequence labels;
   tool->GetDatumLabels(labels);
@@ -211,14 +295,13 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     Handle(XCAFDimTolObjects_DatumObject) object = datum->GetObject();
     if (object.IsNull()) continue;
     const std::string letter = Text(object->GetName());
-    Pending p{label, {}, OwnerOf(label), letter.empty() ? Entry(label) : letter};
+    Pending p{label, {}, OwnerOf(label), letter.empty() ? Entry(label) : letter, "A:" + letter};
     p.desc.alias = "Datum " + letter;
     p.desc.navigationNames = {letter};
     p.desc.typeName = "Datum";
     p.desc.subTypeName = "Datum " + letter;
     p.desc.typeCode = 3;
-    p.desc.anchor = Anchor(object, object->HasPointText(), object->GetPointTextAttach());
-    p.desc.segments = Segments(object->GetPresentation());
+    Place(p, object, object->HasPointText(), object->GetPointTextAttach(), Segments(object->GetPresentation()));
     pending.push_back(std::move(p));
   }
 
@@ -229,18 +312,25 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     if (!label.FindAttribute(XCAFDoc_GeomTolerance::GetID(), tolerance)) continue;
     Handle(XCAFDimTolObjects_GeomToleranceObject) object = tolerance->GetObject();
     if (object.IsNull()) continue;
-    Pending p{label, {}, OwnerOf(label), {}};
     const std::string name = Text(object->GetSemanticName());
+    Pending p{label, {}, OwnerOf(label), {}, "T:" + name};
     double value = object->GetValue();
-    if (value == 0.0 && !name.empty()) toleranceValues_().Find(name, value);
+    if (value == 0.0 && !name.empty()) ToleranceValues().Find(name, value);
     p.desc.typeName = "Geometrical Tolerance";
     p.desc.subTypeName = ToleranceName(object->GetType());
     p.desc.alias = name.empty() ? p.desc.subTypeName + " " + Number(value) : name;
     p.desc.navigationNames = {p.desc.alias};
     p.desc.typeCode = 5;
     p.desc.tolerance = value;
-    p.desc.anchor = Anchor(object, object->HasPointText(), object->GetPointTextAttach());
-    p.desc.segments = Segments(object->GetPresentation());
+    QelModelToleranceFrame frame{.zone = value};
+    if (object->GetTypeOfValue() == XCAFDimTolObjects_GeomToleranceTypeValue_Diameter) frame.zoneShape = "diameter";
+    if (object->GetTypeOfValue() == XCAFDimTolObjects_GeomToleranceTypeValue_SphericalDiameter)
+      frame.zoneShape = "spherical diameter";
+    if (object->GetMaterialRequirementModifier() == XCAFDimTolObjects_GeomToleranceMatReqModif_M) frame.material = "M";
+    if (object->GetMaterialRequirementModifier() == XCAFDimTolObjects_GeomToleranceMatReqModif_L) frame.material = "L";
+    frame.datums = DatumReferences(tool, label);
+    p.desc.frame = std::move(frame);
+    Place(p, object, object->HasPointText(), object->GetPointTextAttach(), Segments(object->GetPresentation()));
     pending.push_back(std::move(p));
   }
 
@@ -251,8 +341,30 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     if (!label.FindAttribute(XCAFDoc_Dimension::GetID(), dimension)) continue;
     Handle(XCAFDimTolObjects_DimensionObject) object = dimension->GetObject();
     if (object.IsNull()) continue;
-    Pending p{label, {}, OwnerOf(label), {}};
     const std::string name = Text(object->GetSemanticName());
+    // The file's dimension of this name and nominal value not taken yet, else the n-th of
+    // this name: files name many dimensions alike ("diameter").
+    const double given = object->GetValue();
+    const std::vector<std::string>& names = draughting.DimensionNames();
+    std::optional<size_t> match;
+    for (size_t i = 0; i < names.size() && !match; ++i) {
+      const std::optional<double> nominal = draughting.DimensionNominal(i);
+      if (names[i] == name && !taken.count(i) && nominal && std::abs(*nominal - given) <= 1e-9 * std::max(1.0, std::abs(given)))
+        match = i;
+    }
+    for (size_t i = 0, at = 0, index = dimensionSeen[name]; i < names.size() && !match; ++i)
+      if (names[i] == name && at++ == index && !taken.count(i)) match = i;
+    ++dimensionSeen[name];
+    std::string key;
+    // The translator gives nominal values and limits in the file's unit, deviations and
+    // shapes in millimetres: the model's unit.
+    double scale = 1.0;
+    if (match) {
+      taken.insert(*match);
+      key = "D:" + std::to_string(*match);
+      scale = draughting.DimensionScale(*match);
+    }
+    Pending p{label, {}, OwnerOf(label), {}, key};
     const XCAFDimTolObjects_DimensionType type = object->GetType();
     if (type == XCAFDimTolObjects_DimensionType_CommonLabel ||
         type == XCAFDimTolObjects_DimensionType_DimensionPresentation) {
@@ -268,18 +380,25 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
       p.desc.typeName = "Dimension";
       p.desc.subTypeName = sub;
       p.desc.typeCode = 6;
-      const double value = object->GetValue();
+      const double value = object->GetValue() * scale;
       p.desc.alias = (name.empty() ? sub : name) + (value != 0.0 ? " " + Number(value) : std::string());
+      QelModelDimensionValue said{.nominal = value};
       // The translator gives the lower deviation as its size below the nominal value.
       if (object->IsDimWithPlusMinusTolerance()) {
         p.desc.tolerance = object->GetUpperTolValue() + object->GetLowerTolValue();
+        said.upper = object->GetUpperTolValue();
+        said.lower = -object->GetLowerTolValue();
       } else if (object->IsDimWithRange()) {
-        p.desc.tolerance = object->GetUpperBound() - object->GetLowerBound();
+        p.desc.tolerance = (object->GetUpperBound() - object->GetLowerBound()) * scale;
+        said.upper = object->GetUpperBound() * scale;
+        said.lower = object->GetLowerBound() * scale;
+        said.limits = true;
       }
+      // A dimension the file gives no value (the translator's 0) says no number.
+      if (value != 0.0 || said.upper || said.lower) p.desc.dimension = said;
     }
     p.desc.navigationNames = {p.desc.alias};
-    p.desc.anchor = Anchor(object, object->HasTextPoint(), object->GetPointTextAttach());
-    p.desc.segments = Segments(object->GetPresentation());
+    Place(p, object, object->HasTextPoint(), object->GetPointTextAttach(), Segments(object->GetPresentation()));
     pending.push_back(std::move(p));
   }
 
@@ -293,10 +412,24 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
   for (const auto& [owner, count] : owners)
     if (count > most) std::tie(main, most) = std::make_pair(owner, count);
 
+  // Names repeat in files ("diameter 35" for four holes): the second and later of a name
+  // get its count, in the translator's order, which is the same at every opening.
+  std::map<std::string, int> named;
+  for (Pending& p : pending) {
+    if (!p.datumKey.empty()) continue;
+    if (const int n = ++named[p.desc.alias]; n > 1) {
+      p.desc.alias += " (" + std::to_string(n) + ")";
+      p.desc.navigationNames = {p.desc.alias};
+    }
+  }
+
   struct Made {
     QelBaseUnknown_var annotation;
     std::string owner;
   };
+  // The file names a callout's annotation by a key two annotations may share (the rows of
+  // a composite frame carry one name): a view showing the key shows both.
+  std::unordered_map<std::string, std::vector<Made>> byKey;
   std::unordered_map<std::string, Made> byLabel;
   std::map<std::pair<std::string, std::string>, QelBaseUnknown_var> datums;  // (owner, letter)
   for (Pending& p : pending) {
@@ -312,8 +445,24 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
       if (!p.datumKey.empty()) datums.emplace(std::make_pair(owner, p.datumKey), made);
     }
     byLabel.emplace(Entry(p.label), Made{made, owner});
+    if (!p.fileKey.empty()) {
+      std::vector<Made>& same = byKey[p.fileKey];
+      if (std::none_of(same.begin(), same.end(), [&](const Made& m) { return m.annotation->IsEqual(made.get()); }))
+        same.push_back(Made{made, owner});
+    }
   }
 
+  // The saved views as the translator gives them, corrected by the file's cameras; the
+  // file's own when the translator gives none.
+  struct Saved {
+    std::string name;
+    QelMathPoint eye;
+    QelMathVector sight, up;
+    bool parallel, front, back;
+    double frontAt, backAt;
+    std::vector<const Made*> shown;
+  };
+  std::vector<Saved> saved;
   Handle(XCAFDoc_ViewTool) views = XCAFDoc_DocumentTool::ViewTool(document_->Main());
   labels.Clear();
   views->GetViewLabels(labels);
@@ -322,42 +471,81 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     if (!label.FindAttribute(XCAFDoc_View::GetID(), view)) continue;
     Handle(XCAFView_Object) object = view->GetObject();
     if (object.IsNull()) continue;
+    const std::string name = Text(object->Name());
+    const QelStepDraughting::Camera* camera = draughting.FindCamera(name);
+    // The translator gives the projection point as the file does, in the camera's own
+    // placement; the file's camera says where that is in the model.
+    Saved v{name,
+            camera ? camera->eye : Point(object->ProjectionPoint()),
+            Vector(object->ViewDirection()),
+            Vector(object->UpDirection()),
+            object->Type() == XCAFView_ProjectionType_Parallel,
+            camera ? camera->frontClipping : static_cast<bool>(object->HasFrontPlaneClipping()),
+            camera ? camera->backClipping : static_cast<bool>(object->HasBackPlaneClipping()),
+            camera ? camera->frontDistance : object->FrontPlaneDistance(),
+            camera ? camera->backDistance : object->BackPlaneDistance(),
+            {}};
     TDF_LabelSequence refs;
     views->GetRefGDTLabel(label, refs);
+    for (const TDF_Label& ref : refs)
+      if (auto it = byLabel.find(Entry(ref)); it != byLabel.end()) v.shown.push_back(&it->second);
+    // The translator leaves some views empty: what the file's view lists stands instead.
+    if (v.shown.empty() && camera)
+      for (const std::string& key : camera->shows)
+        if (auto it = byKey.find(key); it != byKey.end())
+          for (const Made& made : it->second) v.shown.push_back(&made);
+    saved.push_back(std::move(v));
+  }
+  if (saved.empty()) {
+    for (const std::string& name : draughting.ViewNames()) {
+      const QelStepDraughting::Camera* camera = draughting.FindCamera(name);
+      Saved v{name,           camera->eye,           camera->axis,          camera->up, camera->parallel,
+              camera->frontClipping, camera->backClipping, camera->frontDistance, camera->backDistance, {}};
+      for (const std::string& key : camera->shows)
+        if (auto it = byKey.find(key); it != byKey.end())
+          for (const Made& made : it->second) v.shown.push_back(&made);
+      saved.push_back(std::move(v));
+    }
+  }
+
+  for (Saved& v : saved) {
     // The view joins the set holding most of its annotations; the others cannot be its elements.
     std::map<std::string, size_t> bySet;
-    for (const TDF_Label& ref : refs)
-      if (auto it = byLabel.find(Entry(ref)); it != byLabel.end()) ++bySet[it->second.owner];
+    for (const Made* made : v.shown) ++bySet[made->owner];
     std::string owner = main;
     size_t best = 0;
     for (const auto& [candidate, count] : bySet)
       if (count > best) std::tie(owner, best) = std::make_pair(candidate, count);
     std::vector<QelBaseUnknown*> elements;
     size_t elsewhere = 0;
-    for (const TDF_Label& ref : refs) {
-      auto it = byLabel.find(Entry(ref));
-      if (it == byLabel.end()) continue;
-      if (it->second.owner != owner) {
+    for (const Made* made : v.shown) {
+      if (made->owner != owner) {
         ++elsewhere;
         continue;
       }
-      QelBaseUnknown* element = it->second.annotation.get();
+      QelBaseUnknown* element = made->annotation.get();
       if (std::find(elements.begin(), elements.end(), element) == elements.end()) elements.push_back(element);
     }
-    std::string name = Text(object->Name());
-    if (name.empty()) name = "View." + std::to_string(viewCount_ + 1);
+    std::string name = v.name.empty() ? "View." + std::to_string(viewCount_ + 1) : v.name;
     if (elsewhere > 0) {
       notes.push_back("view '" + name + "': " + std::to_string(elsewhere) +
                       " annotations of other products are not among its elements");
     }
-    const QelMathPoint eye = Point(object->ProjectionPoint());
-    const QelMathVector sight = Vector(object->ViewDirection());
-    const QelMathVector up = Vector(object->UpDirection());
+    const QelMathVector& sight = v.sight;
+    const QelMathVector& up = v.up;
     QelMathVector right = sight.Cross(up);
     const double rightLength = right.Norm();
     if (rightLength > 0.0) right = right * (1.0 / rightLength);
-    // The view plane faces the camera: its normal points back along the line of sight.
-    QelModelViewDesc viewDesc{.alias = name, .plane = QelMathPlane(eye, -sight, right, up), .elements = elements};
+    // A saved view clips only where the file asks for a front or back clipping plane: the
+    // front plane faces the camera and cuts what lies before it, the back one what lies
+    // beyond. With both, the front one is kept: a view clips along one plane here.
+    std::optional<QelMathPlane> plane;
+    if (v.front) {
+      plane = QelMathPlane(v.eye + sight * v.frontAt, -sight, right, up);
+    } else if (v.back) {
+      plane = QelMathPlane(v.eye + sight * v.backAt, sight, -right, up);
+    }
+    QelModelViewDesc viewDesc{.alias = name, .plane = plane, .elements = elements};
     QelBaseUnknown_var set = SetFor(owner);
     QelBaseUnknown_var made = builder_.AddView(set, viewDesc);
     // A parallel projection keeps its picture wherever the eye stands along the line of
@@ -365,9 +553,9 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
     // such a camera looks at the scene's centre from twice the scene's size, so that a
     // perspective viewer (30-degree field) sees the whole part in the middle.
     const double reach = sceneSize > 0.0 ? 2.0 * sceneSize : 1.0;
-    QelMathPoint from = eye;
-    QelMathPoint to = eye + sight * std::max((sceneCentre - eye).Dot(sight), reach);
-    if (object->Type() == XCAFView_ProjectionType_Parallel) {
+    QelMathPoint from = v.eye;
+    QelMathPoint to = v.eye + sight * std::max((sceneCentre - v.eye).Dot(sight), reach);
+    if (v.parallel) {
       from = sceneCentre - sight * reach;
       to = sceneCentre;
     }

@@ -330,6 +330,63 @@ class LabelPlacer {
   std::vector<std::vector<int>> grid_;
 };
 
+// A tolerance's characteristic symbol drawn with lines in a size x size box: the font we
+// ship lacks most of them. False for a symbol not known here (drawn as text instead).
+bool DrawSymbol(QelPixelImage& image, const std::string& symbol, int left, int top, int size, const uint8_t rgb[3]) {
+  const double m = size * 0.22, x0 = left + m, y0 = top + m, s = size - 2 * m;
+  auto line = [&](double ax, double ay, double bx, double by) {
+    Line(image, static_cast<int>(std::lround(x0 + ax * s)), static_cast<int>(std::lround(y0 + ay * s)),
+         static_cast<int>(std::lround(x0 + bx * s)), static_cast<int>(std::lround(y0 + by * s)), rgb);
+  };
+  // An arc of the circle of radius r (a fraction of the box) from angle a to b, in turns.
+  auto arc = [&](double r, double a, double b) {
+    const int pieces = 24;
+    for (int i = 0; i < pieces; ++i) {
+      const double t0 = 2 * std::numbers::pi * (a + (b - a) * i / pieces);
+      const double t1 = 2 * std::numbers::pi * (a + (b - a) * (i + 1) / pieces);
+      line(0.5 + r * std::cos(t0), 0.5 - r * std::sin(t0), 0.5 + r * std::cos(t1), 0.5 - r * std::sin(t1));
+    }
+  };
+  if (symbol == "\u2316") {  // position
+    arc(0.32, 0, 1), line(0, 0.5, 1, 0.5), line(0.5, 0, 0.5, 1);
+  } else if (symbol == "\u23E5") {  // flatness
+    line(0.25, 0.3, 1, 0.3), line(0, 0.7, 0.75, 0.7), line(0.25, 0.3, 0, 0.7), line(1, 0.3, 0.75, 0.7);
+  } else if (symbol == "\u23E4") {  // straightness
+    line(0, 0.5, 1, 0.5);
+  } else if (symbol == "\u25CB") {  // circularity
+    arc(0.45, 0, 1);
+  } else if (symbol == "\u232D") {  // cylindricity
+    arc(0.32, 0, 1), line(0.2, 1, 0.45, 0), line(0.55, 1, 0.8, 0);
+  } else if (symbol == "\u2312") {  // profile of a line
+    arc(0.45, 0, 0.5);
+  } else if (symbol == "\u2313") {  // profile of a surface
+    arc(0.45, 0, 0.5), line(0.05, 0.5, 0.95, 0.5);
+  } else if (symbol == "\u2220") {  // angularity
+    line(0, 0.9, 1, 0.9), line(0, 0.9, 0.8, 0.1);
+  } else if (symbol == "\u27C2") {  // perpendicularity
+    line(0, 0.95, 1, 0.95), line(0.5, 0.95, 0.5, 0);
+  } else if (symbol == "\u2225") {  // parallelism
+    line(0.15, 1, 0.5, 0), line(0.5, 1, 0.85, 0);
+  } else if (symbol == "\u25CE") {  // concentricity, coaxiality
+    arc(0.45, 0, 1), arc(0.22, 0, 1);
+  } else if (symbol == "\u232F") {  // symmetry
+    line(0.2, 0.25, 0.8, 0.25), line(0, 0.5, 1, 0.5), line(0.2, 0.75, 0.8, 0.75);
+  } else if (symbol == "\u2197" || symbol == "\u2330") {  // circular and total runout: arrows
+    line(0.1, 1, 0.6, 0), line(0.6, 0, 0.35, 0.1), line(0.6, 0, 0.6, 0.28);
+    if (symbol == "\u2330") line(0.45, 1, 0.95, 0), line(0.95, 0, 0.7, 0.1), line(0.95, 0, 0.95, 0.28), line(0.1, 1, 0.45, 1);
+  } else {
+    return false;
+  }
+  return true;
+}
+
+// Material condition modifiers, circled letters the font lacks, read as "(M)" in pictures.
+std::string PictureText(std::string text) {
+  for (const auto& [from, to] : {std::pair<std::string, std::string>{"\u24C2", "(M)"}, {"\u24C1", "(L)"}})
+    for (size_t at = text.find(from); at != std::string::npos; at = text.find(from, at)) text.replace(at, from.size(), to);
+  return text;
+}
+
 // False when the annotation's frame found no free place (its mark and leaders are drawn).
 bool DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& view, const QelRenderAnnotation& a,
                     LabelPlacer& labels) {
@@ -367,7 +424,19 @@ bool DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
   const int pad = 3;
   const int textWidth = view.text ? view.text->Measure(a.text) : 0;
   const int textHeight = view.text ? view.text->LineHeight() : 10;
-  const int w = std::max(textWidth, 24) + 2 * pad, h = textHeight + 2 * pad;
+  const int h = textHeight + 2 * pad;
+  // A tolerance frame: a square box for its symbol, then one box per compartment.
+  std::vector<std::string> parts;
+  for (const std::string& part : a.compartments) parts.push_back(PictureText(part));
+  std::vector<int> widths;
+  int w = std::max(textWidth, 24) + 2 * pad;
+  if (!parts.empty()) {
+    w = h;
+    for (size_t i = 1; i < parts.size(); ++i) {
+      widths.push_back((view.text ? view.text->Measure(parts[i]) : 8) + 2 * pad);
+      w += widths.back();
+    }
+  }
   const std::optional<LabelPlacer::Box> box = labels.Place(ax, ay, w, h);
   if (!box) return false;
   const int left = box->left, top = box->top;
@@ -380,8 +449,17 @@ bool DrawAnnotation(QelPixelImage& image, const Frame& f, const QelRenderView& v
       const bool border = y < top + 2 || y >= top + h - 2 || x < left + 2 || x >= left + w - 2;
       Blend(image, x, y, border ? rgb : paper);
     }
-  if (view.text && !a.text.empty()) {
-    const QelRenderColor ink{a.color.r * 0.45f, a.color.g * 0.45f, a.color.b * 0.45f};
+  const QelRenderColor ink{a.color.r * 0.45f, a.color.g * 0.45f, a.color.b * 0.45f};
+  if (!parts.empty()) {
+    const uint8_t inkRgb[3] = {Byte(ink.r), Byte(ink.g), Byte(ink.b)};
+    if (!DrawSymbol(image, parts[0], left, top, h, inkRgb) && view.text) view.text->Draw(image, left + pad, top + pad, parts[0], ink);
+    int x = left + h;
+    for (size_t i = 1; i < parts.size(); ++i) {
+      for (int y = top; y < top + h; ++y) Blend(image, x - 1, y, rgb);
+      if (view.text) view.text->Draw(image, x + pad, top + pad, parts[i], ink);
+      x += widths[i - 1];
+    }
+  } else if (view.text && !a.text.empty()) {
     view.text->Draw(image, left + pad, top + pad, a.text, ink);
   }
   return true;
