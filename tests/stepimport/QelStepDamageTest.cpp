@@ -168,17 +168,14 @@ TEST(QelStepDamageTest, WhatTheTranslatorDoesNotReadIsListedWithItsEntities) {
 
 TEST(QelStepDamageTest, PristineFilesListWhatTheTranslatorSkips) {
   QEL_REQUIRE_NIST_MODELS();
-  // FTC-06 writes one profile tolerance in a complex form the translator does not know;
-  // STC-06's saved views are of a form it does not read.
+  // FTC-06 writes one profile tolerance in a complex form the translator does not know.
+  // STC-06's saved views are of a form the translator does not read; the importer reads
+  // them from the file's cameras, so nothing of them is missing.
   std::vector<QelModelNotRead> missing = QelModelBuilder::NotRead(Import(kFtc06).get());
   ASSERT_EQ(missing.size(), 1u);
   EXPECT_EQ(missing[0].kind, "geometric tolerances");
   EXPECT_EQ(missing[0].entities, std::vector<std::string>{"#348"});
-  missing = QelModelBuilder::NotRead(Import(kStc06).get());
-  ASSERT_EQ(missing.size(), 1u);
-  EXPECT_EQ(missing[0].kind, "saved views");
-  EXPECT_EQ(missing[0].count, 12u);
-  EXPECT_EQ(missing[0].entities.size(), 12u);
+  EXPECT_TRUE(QelModelBuilder::NotRead(Import(kStc06).get()).empty());
 }
 
 TEST(QelStepDamageTest, ScanRefusesStrayBytesAndKeepsWhatRealFilesHold) {

@@ -353,6 +353,7 @@ QelBaseUnknown_var Translate(const std::string& path, const std::string& text, c
   }
 
   progress->Enter("annotations");
+  std::multiset<std::string> viewsRead;
   if (annotated) {
     QelStepPmiReader pmi(closer.document, builder, walker.productOf, text);
     QelMathPoint centre{};
@@ -370,10 +371,12 @@ QelBaseUnknown_var Translate(const std::string& path, const std::string& text, c
       if (readAnnotations) throw AnnotationFailure(FailureText(failure));
       throw;
     }
+    viewsRead = pmi.ViewNames();
     for (const std::string& line : left) notes.push_back(path + ": " + line);
     if (readAnnotations && pmi.AnnotationCount() == 0) notes.push_back(path + ": the file holds no semantic annotation");
   }
-  std::vector<QelModelNotRead> missing = QelStepReadCheck::Missing(scan, closer.document, annotated && readAnnotations);
+  std::vector<QelModelNotRead> missing =
+      QelStepReadCheck::Missing(scan, closer.document, annotated && readAnnotations, viewsRead);
   for (const QelModelNotRead& m : missing)
     notes.push_back(path + ": not read: " + std::to_string(m.count) + " " + m.kind);
   builder.SetNotRead(std::move(missing));

@@ -564,5 +564,6 @@ void QelStepPmiReader::Read(const QelMathPoint& sceneCentre, double sceneSize, s
                               .view = made.get(),
                               .camera = QelModelCameraDesc{from, to, up}});
     ++viewCount_;
+    viewNames_.insert(v.name);
   }
 }

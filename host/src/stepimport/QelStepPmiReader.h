@@ -3,6 +3,7 @@
 // dimensions) and saved views of a translated document into a model under construction.
 // Lives for one import; it holds the document's tools and the builder by reference.
 #include <optional>
+#include <set>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -29,6 +30,8 @@ class QelStepPmiReader {
 
   size_t AnnotationCount() const { return annotationCount_; }
   size_t ViewCount() const { return viewCount_; }
+  // The file's names of the saved views made, for the check of what was not read.
+  const std::multiset<std::string>& ViewNames() const { return viewNames_; }
 
  private:
   struct Pending;
@@ -47,4 +50,5 @@ class QelStepPmiReader {
   mutable std::unordered_map<QelBaseUnknown*, std::string> ownerKey_;  // product -> its owner entry
   size_t annotationCount_ = 0;
   size_t viewCount_ = 0;
+  std::multiset<std::string> viewNames_;
 };

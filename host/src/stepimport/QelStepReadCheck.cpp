@@ -20,9 +20,6 @@
 #include <XCAFDoc_Dimension.hxx>
 #include <XCAFDoc_DocumentTool.hxx>
 #include <XCAFDoc_GeomTolerance.hxx>
-#include <XCAFDoc_View.hxx>
-#include <XCAFDoc_ViewTool.hxx>
-#include <XCAFView_Object.hxx>
 #include <XSControl_TransferReader.hxx>
 #include <XSControl_WorkSession.hxx>
 
@@ -33,7 +30,7 @@ std::string Text(const Handle(TCollection_HAsciiString)& text) { return text.IsN
 
 // The names the document holds of one kind, each as often as it holds it.
 struct ReadNames {
-  std::multiset<std::string> datums, tolerances, dimensions, views;
+  std::multiset<std::string> datums, tolerances, dimensions;
 };
 
 ReadNames NamesIn(const Handle(TDocStd_Document)& document) {
@@ -64,14 +61,6 @@ ReadNames NamesIn(const Handle(TDocStd_Document)& document) {
         type == XCAFDimTolObjects_DimensionType_DimensionPresentation)
       continue;
     names.dimensions.insert(Text(dimension->GetObject()->GetSemanticName()));
-  }
-  Handle(XCAFDoc_ViewTool) views = XCAFDoc_DocumentTool::ViewTool(document->Main());
-  labels.Clear();
-  views->GetViewLabels(labels);
-  for (const TDF_Label& label : labels) {
-    Handle(XCAFDoc_View) view;
-    if (label.FindAttribute(XCAFDoc_View::GetID(), view) && !view->GetObject().IsNull())
-      names.views.insert(Text(view->GetObject()->Name()));
   }
   return names;
 }
@@ -147,7 +136,8 @@ std::vector<std::string> QelStepReadCheck::TransferFailures(STEPCAFControl_Reade
 }
 
 std::vector<QelModelNotRead> QelStepReadCheck::Missing(const QelStepDataScan& scan,
-                                                       const Handle(TDocStd_Document)& document, bool annotationsRead) {
+                                                       const Handle(TDocStd_Document)& document, bool annotationsRead,
+                                                       const std::multiset<std::string>& views) {
   std::map<Kind, std::vector<const QelStepDataScan::Declared*>> byKind;
   std::map<std::string, std::vector<const QelStepDataScan::Declared*>> tessellated;
   for (const QelStepDataScan::Declared& d : scan.Entities()) {
@@ -164,8 +154,7 @@ std::vector<QelModelNotRead> QelStepReadCheck::Missing(const QelStepDataScan& sc
   Compare(byKind[Kind::Datum], {letters.begin(), letters.end()}, true, "datums", out);
   Compare(byKind[Kind::Tolerance], read.tolerances, false, "geometric tolerances", out);
   Compare(byKind[Kind::Dimension], read.dimensions, false, "dimensions", out);
-  // Saved views are read whether the annotations were or not.
-  Compare(byKind[Kind::SavedView], annotationsRead ? read.views : NamesIn(document).views, false, "saved views", out);
+  Compare(byKind[Kind::SavedView], views, false, "saved views", out);
   // This translator reads no tessellated shape of a part at all.
   for (const auto& [type, entities] : tessellated) {
     std::multiset<std::string> none;

@@ -4,6 +4,7 @@
 // part of a shape or product without a word), and what the file declares (datums,
 // tolerances, dimensions, saved views, tessellated shapes) against what the translated
 // document holds, which becomes the model's list of what was not read.
+#include <set>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -25,10 +26,11 @@ class QelStepReadCheck {
   // most kMaxNamed; `text` is the file's text, where each entity's type is looked up.
   static std::vector<std::string> TransferFailures(STEPCAFControl_Reader& reader, std::string_view text);
 
-  // The kinds the document lacks against the file's declarations. `annotationsRead` false:
-  // no datum, tolerance or dimension was read at all.
+  // The kinds the model lacks against the file's declarations. `annotationsRead` false:
+  // no datum, tolerance or dimension was read at all. `views`: the names of the saved views
+  // the model holds (the importer reads them from the file where the translator cannot).
   static std::vector<QelModelNotRead> Missing(const QelStepDataScan& scan, const Handle(TDocStd_Document)& document,
-                                              bool annotationsRead);
+                                              bool annotationsRead, const std::multiset<std::string>& views);
 
   // The type keyword of entity #id in `text`, or "".
   static std::string TypeOf(std::string_view text, uint64_t id);
