@@ -412,6 +412,14 @@ bool Select(QelHostSession& session, const Args& args, std::string& error) {
   return true;
 }
 
+// The product named `name` of the open model, or null with `error`.
+QelPLMProductOccurrence* FindProduct(QelHostSession& session, const std::string& name, std::string& error) {
+  QelListValQelBaseUnknown_var found = QelModelPrinter::FindByAlias(session.Root(), name);
+  auto* product = found.Size() ? QelSysDynamicCast<QelPLMProductOccurrence>(found[1].get()) : nullptr;
+  if (!product) error = "the model has no product \"" + name + "\"";
+  return product;
+}
+
 bool LightLoad(QelHostSession& session, const Args& args, std::string& error) {
   if (!Expect(args, 2, 2, "a product's name and on or off", error)) return false;
   if (args[1] != "on" && args[1] != "off") {
@@ -422,12 +430,8 @@ bool LightLoad(QelHostSession& session, const Args& args, std::string& error) {
     error = "no model is open";
     return false;
   }
-  QelListValQelBaseUnknown_var found = QelModelPrinter::FindByAlias(session.Root(), args[0]);
-  auto* product = found.Size() ? QelSysDynamicCast<QelPLMProductOccurrence>(found[1].get()) : nullptr;
-  if (!product) {
-    error = "the model has no product \"" + args[0] + "\"";
-    return false;
-  }
+  QelPLMProductOccurrence* product = FindProduct(session, args[0], error);
+  if (!product) return false;
   product->SetLightLoadMode(args[1] == "on");
   session.Out() << "light-load mode of " << args[0] << " " << args[1] << '\n';
   return true;
@@ -439,24 +443,9 @@ bool UiActive(QelHostSession& session, const Args& args, std::string& error) {
     error = "no open editor";
     return false;
   }
-  QelListValQelBaseUnknown_var found = QelModelPrinter::FindByAlias(session.Root(), args[0]);
-  auto* product = found.Size() ? QelSysDynamicCast<QelPLMProductOccurrence>(found[1].get()) : nullptr;
-  if (!product) {
-    error = "the model has no product \"" + args[0] + "\"";
-    return false;
-  }
-  // The path runs from the root down to the product, as a click in the product tree makes it.
-  std::vector<QelBaseUnknown_var> chain;
-  for (QelBaseUnknown_var at = QelBaseUnknown_var::Retain(product); at && chain.size() < 64;) {
-    chain.push_back(at);
-    auto* occurrence = QelSysDynamicCast<QelPLMProductOccurrence>(at.get());
-    QelBaseUnknown_var father;
-    if (!occurrence || occurrence->GetFather(father) != S_OK) break;
-    at = father;
-  }
-  auto path = QelMakeVar<QelPathElement>();
-  for (auto it = chain.rbegin(); it != chain.rend(); ++it) path->AddChildElement(it->get());
-  session.Editor()->SetUIActivePath(path.get());
+  QelPLMProductOccurrence* product = FindProduct(session, args[0], error);
+  if (!product) return false;
+  session.MakeUIActive(product);
   session.Out() << "UI-active: " << args[0] << '\n';
   return true;
 }

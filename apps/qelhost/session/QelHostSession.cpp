@@ -1,11 +1,6 @@
 #include "QelHostSession.h"
 
-#include "QelApplicationFrame.h"
-#include "QelFrmLayout.h"
-#include "QelModelScene.h"
-
 #include <editline/readline.h>
-
 #include <signal.h>
 
 #include <csignal>
@@ -16,14 +11,18 @@
 #include "QelApplicationFrame.h"
 #include "QelDelayedDestruction.h"
 #include "QelDictionary.h"
-#include "QelSettingRepository.h"
 #include "QelDlgNotify.h"
+#include "QelFrmLayout.h"
 #include "QelHostCommands.h"
 #include "QelHostDisplayReasons.h"
 #include "QelHostModelFiles.h"
 #include "QelModelLoader.h"
+#include "QelModelScene.h"
+#include "QelPLMProductOccurrence.h"
+#include "QelPathElement.h"
 #include "QelRovFacetServices.h"
 #include "QelSampleProduct.h"
+#include "QelSettingRepository.h"
 
 namespace {
 bool IsShown(QelBaseUnknown* object) { return QelRovFacetServices::IsDisplayEnabled(object) == S_OK; }
@@ -248,4 +247,16 @@ int QelHostSession::RunInteractive() {
   }
   QelDlgNotify::SetAsker(nullptr);
   return 0;
+}
+
+bool QelHostSession::MakeUIActive(QelBaseUnknown* product) {
+  auto* occurrence = QelSysDynamicCast<QelPLMProductOccurrence>(product);
+  if (!editor_ || !occurrence) return false;
+  // The path runs from the root down to the product, as a click in a product tree makes it.
+  std::vector<QelPLMProductOccurrence*> chain;
+  for (QelPLMProductOccurrence* at = occurrence; at; at = at->Father()) chain.push_back(at);
+  auto path = QelMakeVar<QelPathElement>();
+  for (auto it = chain.rbegin(); it != chain.rend(); ++it) path->AddChildElement(*it);
+  editor_->SetUIActivePath(path.get());
+  return true;
 }

@@ -54,6 +54,9 @@ class QelHostSession {
   std::ostream& Out() { return out_; }
   QelBaseUnknown* Root() const { return root_.get(); }
   QelFrmEditor* Editor() const { return editor_.get(); }
+  // Makes `product` (a product of the open model) the UI-active object, along its path from
+  // the root; the views browser follows. False without an editor or for another object.
+  bool MakeUIActive(QelBaseUnknown* product);
   QelIHyxFacetCtrl* Controller() const { return controller_.get(); }
   // The open model's 3D viewer, in the current window.
   Qel3DViewer* Viewer() const { return viewer_.get(); }

@@ -320,18 +320,8 @@ QelHostWebReply QelHostWebApi::UiActive(std::string_view body) {
   const auto number = request["product"].get<int64_t>();
   if (number < 1 || number > static_cast<int64_t>(products_.size()))
     return Error(400, "no product " + std::to_string(number));
-  std::vector<QelBaseUnknown_var> chain;
-  for (QelBaseUnknown_var at = products_[static_cast<size_t>(number - 1)]; at && chain.size() < 64;) {
-    chain.push_back(at);
-    auto* occurrence = QelSysDynamicCast<QelPLMProductOccurrence>(at.get());
-    QelBaseUnknown_var father;
-    if (!occurrence || occurrence->GetFather(father) != S_OK) break;
-    at = father;
-  }
-  auto path = QelMakeVar<QelPathElement>();
-  for (auto it = chain.rbegin(); it != chain.rend(); ++it) path->AddChildElement(it->get());
   // The browser follows through its context; the items it lists now get new ids.
-  session_.Editor()->SetUIActivePath(path.get());
+  session_.MakeUIActive(products_[static_cast<size_t>(number - 1)].get());
   QelDelayedDestruction::FlushIdle();
   return State();
 }
