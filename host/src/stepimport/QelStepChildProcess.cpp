@@ -52,6 +52,14 @@ bool WriteAll(int fd, const std::string& bytes) {
   // A crash leaves no core file behind, and an exceeded processor time ends the child
   // with SIGXCPU, then SIGKILL a few seconds later should it catch that.
   Limit(RLIMIT_CORE, 0, 0);
+  // Everything the person reads comes back through the pipe: whatever the translator, or a
+  // sanitizer's report of its crash, would print goes nowhere, rather than between the
+  // parent's own lines.
+  if (const int null = open("/dev/null", O_WRONLY | O_CLOEXEC); null >= 0) {
+    dup2(null, STDOUT_FILENO);
+    dup2(null, STDERR_FILENO);
+    close(null);
+  }
   const auto cpu = static_cast<rlim_t>(limits.cpuSeconds + 0.999);
   Limit(RLIMIT_CPU, cpu, cpu + 5);
   if (kMayLimitMemory && limits.memoryBytes > 0) Limit(RLIMIT_AS, limits.memoryBytes, limits.memoryBytes);
