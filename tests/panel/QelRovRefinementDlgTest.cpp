@@ -102,6 +102,46 @@ TEST_F(DialogTest, ARebuildKeepsTheRowsOfEverySectionItWouldMakeAlike) {
   EXPECT_EQ(QelVidPrintJson(dialog.get()), printed);
 }
 
+// Items gone from the middle of a group: the rows of those after them are renewed where
+// they now stand, not made again, and the panel reads as a fresh build would.
+TEST_F(DialogTest, ARowFollowsItsPropertyWhenItemsBeforeItGo) {
+  auto group = Make<TestFacetGroup>(editor.get());
+  auto grouped = Make<TestFacet>(group.get());
+  auto kind = Make<QelRovFacetPropertyGroup>(QelUnicodeString("Kind"), QelUnicodeString(), grouped.get(), false);
+  std::vector<QelVar<QelRovFacetPropertyItem>> items;
+  for (const char* name : {"a", "b", "c", "d"}) {
+    items.push_back(Make<QelRovFacetPropertyItem>(QelUnicodeString(name), kind.get()));
+    kind->AddProperty(items.back().get());
+  }
+  grouped->Add(kind.get());
+  QelListValQelBaseUnknown_var facets;
+  facets.Append(static_cast<QelBaseUnknown*>(grouped.get()));
+  auto dialog = Make<QelRovRefinementDlg>(nullptr, QelString("QelRovRefinementDlg"), facets, editor.get());
+  ASSERT_EQ(dialog->BuildFacetWidgets(), S_OK);
+  auto itemRows = [&] {
+    auto* section = dynamic_cast<QelRovRefinementFacet*>(dialog->GetGrid()->GetWidgetsInRow(0).at(0));
+    auto* kindRow = dynamic_cast<QelRovRefinementProperty*>(section->GetGrid()->GetWidgetsInRow(0).at(0));
+    std::vector<QelVidWidget*> rows;
+    for (int i = 0; i < kindRow->GetGrid()->GetRowCount(); ++i) rows.push_back(kindRow->GetGrid()->GetWidgetsInRow(i).at(0));
+    return rows;
+  };
+  const std::vector<QelVidWidget*> before = itemRows();
+  ASSERT_EQ(before.size(), 4u);
+
+  kind->RemoveAllProperties();
+  for (size_t i : {0u, 2u, 3u}) kind->AddProperty(items[i].get());
+  dialog->RefreshFacetWidgets();
+  const std::vector<QelVidWidget*> after = itemRows();
+  ASSERT_EQ(after.size(), 3u);
+  EXPECT_EQ(after[0], before[0]);
+  EXPECT_EQ(after[1], before[2]) << "c's row moved up with it";
+  EXPECT_EQ(after[2], before[3]);
+  const std::string renewed = QelVidPrintJson(dialog.get());
+  auto fresh = Make<QelRovRefinementDlg>(nullptr, QelString("QelRovRefinementDlg"), facets, editor.get());
+  ASSERT_EQ(fresh->BuildFacetWidgets(), S_OK);
+  EXPECT_EQ(renewed, QelVidPrintJson(fresh.get()));
+}
+
 TEST_F(DialogTest, CloseReachesTheControllerEvenWithoutAFacetGroup) {
   QelRovFacetController* ctrl = Controller();
   WriteSetting("LumReview", 1, true);

@@ -1,5 +1,7 @@
 #include "QelRovRefinementProperty.h"
 
+#include <unordered_map>
+
 #include "QelAssert.h"
 #include "QelListValQelBaseUnknown_var.h"
 #include "QelRovFacetProperty.h"
@@ -200,13 +202,26 @@ HRESULT QelRovRefinementProperty::BuildSubPropertyWidgets(QelRovFacetProperty* p
   if (previous && previous != this && previous->kind_ == KindExpander && previous->grid_ &&
       previous->property_.IsAlive() && previous->property_.RefersTo(property))
     retired = previous->grid_->TakeWidgets();
+  // Each retired row is offered to the new row of its own property, wherever that row now
+  // stands: removing items from the middle of a group then renews every row after them
+  // instead of making them again.
+  std::unordered_map<QelBaseUnknown*, QelVidWidget*> retiredByProperty;
+  retiredByProperty.reserve(retired.size());
+  for (const QelVar<QelVidWidget>& row : retired)
+    if (QelRovRefinementProperty* old = From(row.get()))
+      if (QelBaseUnknown* of = old->property_.GetRaw()) retiredByProperty.emplace(of, row.get());
   grid_->Reserve(static_cast<size_t>(children.Size()));
   const std::string baseName = propertyName_.Utf8() + "_Property";
   int hidden = 0;
   for (int i = 1; i <= children.Size(); ++i) {
     QelBaseUnknown* child = children[i].get();
     const bool alternate = (i - hidden) % 2 == 0;
-    QelVidWidget* old = static_cast<size_t>(i - 1) < retired.size() ? retired[static_cast<size_t>(i - 1)].get() : nullptr;
+    QelVidWidget* old = nullptr;
+    if (child)
+      if (auto found = retiredByProperty.find(child->GetImpl()); found != retiredByProperty.end()) {
+        old = found->second;
+        retiredByProperty.erase(found);
+      }
     QelVar<QelRovRefinementProperty> widget =
         RenewOrMake(this, QelString(baseName + std::to_string(i - 1)), child, alternate, old, nullptr);
     if (widget && PlaceRow(grid_, widget.get(), i - 1, child)) ++hidden;
