@@ -1,6 +1,6 @@
 #pragma once
-// What the STEP import tests share: the NIST models' paths, an import that must succeed,
-// and the model seen as the JSON model file it writes to (a tree the tests can search).
+// What the STEP import tests share: the NIST models' paths, an import that must succeed, a
+// refusal that must leave nothing behind, and the model seen as the JSON model file it writes to (a tree the tests can search).
 #include <gtest/gtest.h>
 
 #include <sstream>
@@ -24,6 +24,19 @@ inline QelBaseUnknown_var Import(const std::string& path, std::vector<std::strin
   EXPECT_EQ(QelStepImporter::ImportFile(path, root, error, lines), S_OK) << error;
   if (notes) *notes = lines;
   return root;
+}
+
+// The refusal's message, after checking that nothing was made and the file is named.
+inline std::string Refusal(const std::string& path) {
+  const int64_t before = QelBaseUnknown::LiveObjectCount();
+  QelBaseUnknown_var root;
+  std::string error;
+  std::vector<std::string> notes;
+  EXPECT_EQ(QelStepImporter::ImportFile(path, root, error, notes), E_FAIL) << path;
+  EXPECT_FALSE(root);
+  EXPECT_EQ(error.rfind(path + ": ", 0), 0u) << error;
+  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), before) << "half-imported objects left behind";
+  return error;
 }
 
 inline nlohmann::json Dump(QelBaseUnknown* root) {

@@ -33,18 +33,6 @@ const std::string kAP242Header =
     "ISO-10303-21;\nHEADER;\nFILE_DESCRIPTION((''),'2;1');\nFILE_NAME('x','',(''),(''),'','','');\n"
     "FILE_SCHEMA(('AP242_MANAGED_MODEL_BASED_3D_ENGINEERING_MIM_LF { 1 0 10303 442 1 1 4 }'));\nENDSEC;\n";
 
-// The refusal's message, after checking that nothing was made and the file is named.
-std::string Refusal(const std::string& path) {
-  const int64_t before = QelBaseUnknown::LiveObjectCount();
-  QelBaseUnknown_var root;
-  std::string error;
-  std::vector<std::string> notes;
-  EXPECT_EQ(QelStepImporter::ImportFile(path, root, error, notes), E_FAIL) << path;
-  EXPECT_FALSE(root);
-  EXPECT_EQ(error.rfind(path + ": ", 0), 0u) << error;
-  EXPECT_EQ(QelBaseUnknown::LiveObjectCount(), before) << "half-imported objects left behind";
-  return error;
-}
 }  // namespace
 
 TEST(QelStepRefusalTest, EachKindOfBadFileIsRefusedWithItsReason) {

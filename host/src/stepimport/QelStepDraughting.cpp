@@ -7,6 +7,8 @@
 #include <functional>
 #include <unordered_set>
 
+#include "QelStepStatementIndex.h"
+
 namespace {
 constexpr size_t kMaxSegments = 4000;  // per annotation, as for drawings the translator gives
 constexpr size_t npos = std::string_view::npos;
@@ -112,19 +114,12 @@ struct Place {
 
 class Scanner {
  public:
-  explicit Scanner(std::string_view text) { Index(text); }
+  explicit Scanner(std::string_view text) : index_(text) {}
 
-  std::string_view At(long id) const {
-    auto it = statements_.find(id);
-    return it == statements_.end() ? std::string_view() : it->second;
-  }
+  std::string_view At(long id) const { return index_.At(id); }
   std::optional<std::string_view> Args(long id, std::string_view type) const { return Record(At(id), type); }
-  const std::vector<long>& Order() const { return order_; }
-  const std::vector<long>& Referrers(long id) const {
-    static const std::vector<long> none;
-    auto it = referrers_.find(id);
-    return it == referrers_.end() ? none : it->second;
-  }
+  const std::vector<long>& Order() const { return index_.Order(); }
+  const std::vector<long>& Referrers(long id) const { return index_.Referrers(id); }
 
   std::vector<double> Triple(long id, std::string_view type) const {
     std::vector<double> out;
@@ -165,46 +160,7 @@ class Scanner {
   }
 
  private:
-  void Index(std::string_view text) {
-    const size_t data = text.find("DATA;");
-    size_t i = data == npos ? 0 : data + 5;
-    while (i < text.size()) {
-      if (text[i] == '\'') {  // a string outside any entity (never in a valid file): skip it
-        const size_t close = text.find('\'', i + 1);
-        i = close == npos ? text.size() : close + 1;
-        continue;
-      }
-      if (text[i] != '#') {
-        ++i;
-        continue;
-      }
-      char* end = nullptr;
-      const long id = std::strtol(text.data() + i + 1, &end, 10);
-      size_t at = static_cast<size_t>(end - text.data());
-      while (at < text.size() && IsSpace(text[at])) ++at;
-      if (at >= text.size() || text[at] != '=') {
-        i = at + 1;
-        continue;
-      }
-      const size_t begin = ++at;
-      bool quoted = false;
-      while (at < text.size() && (quoted || text[at] != ';')) {
-        if (text[at] == '\'') quoted = !quoted;
-        if (!quoted && text[at] == '#') {
-          const long ref = std::strtol(text.data() + at + 1, nullptr, 10);
-          auto& list = referrers_[ref];
-          if (list.empty() || list.back() != id) list.push_back(id);
-        }
-        ++at;
-      }
-      if (statements_.emplace(id, text.substr(begin, at - begin)).second) order_.push_back(id);
-      i = at + 1;
-    }
-  }
-
-  std::unordered_map<long, std::string_view> statements_;
-  std::unordered_map<long, std::vector<long>> referrers_;
-  std::vector<long> order_;
+  QelStepStatementIndex index_;
 };
 
 bool IsDimension(std::string_view s) {

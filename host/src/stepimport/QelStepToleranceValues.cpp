@@ -5,37 +5,9 @@
 #include <string>
 #include <vector>
 
+#include "QelStepStatementIndex.h"
+
 namespace {
-// Entity number -> its statement (from after '=' to the closing ';'), skipping strings so a
-// ';' inside a name does not end a statement.
-std::unordered_map<long, std::string_view> Statements(std::string_view text, std::vector<long>& order) {
-  std::unordered_map<long, std::string_view> out;
-  size_t data = text.find("DATA;");
-  size_t i = data == std::string_view::npos ? 0 : data + 5;
-  while (i < text.size()) {
-    if (text[i] != '#') {
-      ++i;
-      continue;
-    }
-    char* end = nullptr;
-    const long id = std::strtol(text.data() + i + 1, &end, 10);
-    size_t at = static_cast<size_t>(end - text.data());
-    while (at < text.size() && std::isspace(static_cast<unsigned char>(text[at]))) ++at;
-    if (at >= text.size() || text[at] != '=') {
-      i = at + 1;
-      continue;
-    }
-    const size_t begin = ++at;
-    bool quoted = false;
-    while (at < text.size() && (quoted || text[at] != ';')) {
-      if (text[at] == '\'') quoted = !quoted;
-      ++at;
-    }
-    if (out.emplace(id, text.substr(begin, at - begin)).second) order.push_back(id);
-    i = at + 1;
-  }
-  return out;
-}
 
 // A quoted string starting at `at` (on the quote); moves `at` past it.
 bool QuotedString(std::string_view s, size_t& at, std::string& value) {
@@ -80,7 +52,7 @@ double UnitScale(std::string_view unit) {
 }
 
 // The value of a measure entity: "...MEASURE(<number>),#unit..." in a simple or complex instance.
-bool Measure(std::string_view measure, const std::unordered_map<long, std::string_view>& statements, double& value) {
+bool Measure(std::string_view measure, const QelStepStatementIndex& statements, double& value) {
   const size_t key = measure.find("_MEASURE(");
   if (key == std::string_view::npos) return false;
   size_t at = key + 9;
@@ -92,17 +64,16 @@ bool Measure(std::string_view measure, const std::unordered_map<long, std::strin
   if (at == std::string_view::npos) return true;
   ++at;
   const long unit = Reference(measure, at);
-  if (auto it = statements.find(unit); it != statements.end()) value *= UnitScale(it->second);
+  if (const std::string_view unitStatement = statements.At(unit); !unitStatement.empty()) value *= UnitScale(unitStatement);
   return true;
 }
 }  // namespace
 
 QelStepToleranceValues QelStepToleranceValues::Scan(std::string_view text) {
   QelStepToleranceValues found;
-  std::vector<long> order;
-  const auto statements = Statements(text, order);
-  for (long id : order) {
-    const std::string_view statement = statements.at(id);
+  const QelStepStatementIndex statements(text);
+  for (long id : statements.Order()) {
+    const std::string_view statement = statements.At(id);
     // GEOMETRIC_TOLERANCE('name','description',#magnitude,#target) or one of its subtypes;
     // the value and plus-minus tolerances have no name and are not matched.
     const size_t key = statement.find("TOLERANCE('");
@@ -114,9 +85,9 @@ QelStepToleranceValues QelStepToleranceValues::Scan(std::string_view text) {
     if (at < statement.size() && statement[at] == '$') ++at;
     else if (!QuotedString(statement, at, description)) continue;
     const long magnitude = Reference(statement, at);
-    auto it = statements.find(magnitude);
+    const std::string_view measure = statements.At(magnitude);
     double value = 0.0;
-    if (it != statements.end() && Measure(it->second, statements, value)) found.values_.emplace(name, value);
+    if (!measure.empty() && Measure(measure, statements, value)) found.values_.emplace(name, value);
   }
   return found;
 }
